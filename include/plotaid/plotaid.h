@@ -1,0 +1,7 @@
+#ifndef PLOTAID_PLOTAID_H
+#define PLOTAID_PLOTAID_H
+
+// Everything a host needs: one header per exported class.
+#include <plotaid/ChartException.h>
+
+#endif

@@ -1,0 +1,20 @@
+#include "ToolRunner.h"
+
+#include <array>
+#include <cstdio>
+#include <sys/wait.h>
+
+ToolResult runTool(const std::string& args) {
+    ToolResult r;
+    const std::string cmd = std::string("'") + PLOTAID_TOOL_PATH + "' " + args + " 2>&1";
+    FILE* p = popen(cmd.c_str(), "r");
+    if (!p)
+        return r;
+    std::array<char, 4096> buf;
+    size_t n;
+    while ((n = fread(buf.data(), 1, buf.size(), p)) > 0)
+        r.output.append(buf.data(), n);
+    const int status = pclose(p);
+    r.exitCode = WIFEXITED(status) ? WEXITSTATUS(status) : -1;
+    return r;
+}

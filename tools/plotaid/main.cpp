@@ -1,0 +1,111 @@
+#include "Command.h"
+
+#include <algorithm>
+#include <cstdio>
+#include <fstream>
+#include <iostream>
+#include <iterator>
+#include <sstream>
+
+namespace plotaid::tool {
+
+namespace {
+std::vector<Command>& registry() {
+    static std::vector<Command> all;
+    return all;
+}
+
+void printUsage(std::FILE* to) {
+    std::fprintf(to, "usage: plotaid [--help] [--version] <command> [<args>]\n\ncommands:\n");
+    std::vector<Command> sorted = registry();
+    std::sort(sorted.begin(), sorted.end(),
+              [](const Command& a, const Command& b) { return std::string(a.name) < b.name; });
+    for (const Command& c : sorted)
+        std::fprintf(to, "  %-12s %s\n", c.name, c.summary);
+    std::fprintf(to, "\n'plotaid <command> --help' describes a command.\n");
+}
+} // namespace
+
+Registrar::Registrar(const Command& command) { registry().push_back(command); }
+
+const std::vector<Command>& commands() { return registry(); }
+
+bool wantsHelp(const Args& args) {
+    return std::any_of(args.begin(), args.end(), [](const std::string& a) { return a == "--help" || a == "-h"; });
+}
+
+int usageError(const char* command, const std::string& message) {
+    std::fprintf(stderr, "plotaid %s: %s\n(see 'plotaid %s --help')\n", command, message.c_str(), command);
+    return kUsage;
+}
+
+int failure(const char* command, const std::string& message) {
+    std::fprintf(stderr, "plotaid %s: %s\n", command, message.c_str());
+    return kFailed;
+}
+
+bool readFile(const std::string& path, std::string& out, std::string& error) {
+    if (path == "-") {
+        std::ostringstream s;
+        s << std::cin.rdbuf();
+        out = s.str();
+        return true;
+    }
+    std::ifstream in(path, std::ios::binary);
+    if (!in) {
+        error = "cannot open '" + path + "'";
+        return false;
+    }
+    out.assign(std::istreambuf_iterator<char>(in), std::istreambuf_iterator<char>());
+    if (in.bad()) {
+        error = "cannot read '" + path + "'";
+        return false;
+    }
+    return true;
+}
+
+bool writeFile(const std::string& path, const std::string& bytes, std::string& error) {
+    if (path == "-") {
+        std::cout.write(bytes.data(), static_cast<std::streamsize>(bytes.size()));
+        std::cout.flush();
+        if (!std::cout) {
+            error = "cannot write to standard output";
+            return false;
+        }
+        return true;
+    }
+    std::ofstream out(path, std::ios::binary | std::ios::trunc);
+    out.write(bytes.data(), static_cast<std::streamsize>(bytes.size()));
+    out.close();
+    if (!out) {
+        error = "cannot write '" + path + "'";
+        return false;
+    }
+    return true;
+}
+
+} // namespace plotaid::tool
+
+int main(int argc, char** argv) {
+    using namespace plotaid::tool;
+    if (argc < 2) {
+        printUsage(stderr);
+        return kUsage;
+    }
+    const std::string first = argv[1];
+    if (first == "--help" || first == "-h" || first == "help") {
+        printUsage(stdout);
+        return kOk;
+    }
+    if (first == "--version") {
+        std::printf("plotaid %s\n", PLOTAID_VERSION);
+        return kOk;
+    }
+    for (const Command& c : commands()) {
+        if (first == c.name)
+            return c.run(Args(argv + 2, argv + argc));
+    }
+    std::fprintf(stderr, "plotaid: unknown command '%s'\n", first.c_str());
+    printUsage(stderr);
+    return kUsage;
+}
