@@ -3,5 +3,6 @@
 
 // Everything a host needs: one header per exported class.
 #include <plotaid/ChartException.h>
+#include <plotaid/ChartKey.h>
 
 #endif
