@@ -7,7 +7,8 @@
 // (any name iconv knows, such as "CP1252" or "ISO-8859-1").
 namespace osport {
 
-void setHostEncoding(const std::string& encoding);
+// False, and the host encoding unchanged, when iconv does not know the name.
+bool setHostEncoding(const std::string& encoding);
 std::string hostEncoding();
 
 // Host text <-> UTF-16 in the host encoding. Each returns a NUL-terminated buffer allocated with
@@ -26,7 +27,7 @@ bool KovarMBGenericToU16(KovarMBConverter* converter, const std::string& in, std
 bool KovarMBU16ToGeneric(KovarMBConverter* converter, const char16_t* in, std::string& out);
 
 // The position just past the multibyte character that starts at text (host encoding); text itself
-// at its terminating NUL.
+// at its terminating NUL (or when null). A byte that starts no valid character counts as one.
 const char* KovarMBstrinc_A(const char* text);
 
 } // namespace osport
