@@ -4,5 +4,7 @@
 // Everything a host needs: one header per exported class.
 #include <plotaid/ChartException.h>
 #include <plotaid/ChartKey.h>
+#include <plotaid/TimeConverter.h>
+#include <plotaid/TimeStamp.h>
 
 #endif
