@@ -1,0 +1,130 @@
+#include "GrammarSupport.h"
+
+#include <algorithm>
+#include <cstdio>
+#include <cstdlib>
+#include <filesystem>
+#include <fstream>
+#include <iterator>
+#include <stdexcept>
+#include <sys/wait.h>
+
+namespace grammar_test {
+namespace fs = std::filesystem;
+
+namespace {
+// Made on first use, removed with everything in it when the test program ends.
+struct ScratchFolder {
+    std::string path;
+    ScratchFolder() {
+        std::string pattern = (fs::temp_directory_path() / "plotaid-grammar-XXXXXX").string();
+        if (::mkdtemp(pattern.data()) == nullptr)
+            throw std::runtime_error("cannot make a scratch folder");
+        path = pattern + "/";
+    }
+    ~ScratchFolder() {
+        std::error_code ignored;
+        fs::remove_all(path, ignored);
+    }
+};
+
+const std::string& scratchFolder() {
+    static const ScratchFolder folder;
+    return folder.path;
+}
+
+std::string quoted(const std::string& s) {
+    std::string out = "'";
+    for (char c : s)
+        out += c == '\'' ? std::string("'\\''") : std::string(1, c);
+    return out + "'";
+}
+
+const std::string& catalog() {
+    static const std::string path = [] {
+        const std::string to = "file://" + schemaFolder();
+        std::string text = "<?xml version=\"1.0\"?>\n"
+                           "<catalog xmlns=\"urn:oasis:names:tc:entity:xmlns:xml:catalog\">\n";
+        for (const char* from : {"http://plotaid.org/grxml/data/", "http://plotaid.org/grxml/"}) {
+            text += "  <rewriteSystem systemIdStartString=\"" + std::string(from) + "\" rewritePrefix=\"" +
+                    to + "\"/>\n";
+            text +=
+                "  <rewriteURI uriStartString=\"" + std::string(from) + "\" rewritePrefix=\"" + to + "\"/>\n";
+        }
+        text += "</catalog>\n";
+        return writeScratch("catalog.xml", text);
+    }();
+    return path;
+}
+} // namespace
+
+std::string schemaFolder() {
+    return std::string(PLOTAID_SOURCE_DIR) + "/resources/schemas/";
+}
+
+std::vector<std::string> sampleCharts() {
+    std::vector<std::string> charts;
+    for (const auto& entry : fs::directory_iterator(std::string(PLOTAID_EXAMPLES_DIR) + "/charts"))
+        if (entry.path().extension() == ".xml")
+            charts.push_back(entry.path().string());
+    std::sort(charts.begin(), charts.end());
+    return charts;
+}
+
+std::string readText(const std::string& path) {
+    std::ifstream in(path, std::ios::binary);
+    if (!in)
+        throw std::runtime_error("cannot read " + path);
+    return std::string(std::istreambuf_iterator<char>(in), std::istreambuf_iterator<char>());
+}
+
+std::string writeScratch(const std::string& name, const std::string& text) {
+    const std::string path = scratchFolder() + name;
+    std::ofstream out(path, std::ios::binary | std::ios::trunc);
+    out << text;
+    if (!out)
+        throw std::runtime_error("cannot write " + path);
+    return path;
+}
+
+std::string replaceOnce(const std::string& text, const std::string& from, const std::string& to) {
+    const std::string::size_type at = text.find(from);
+    if (at == std::string::npos)
+        return std::string();
+    std::string out = text;
+    out.replace(at, from.size(), to);
+    return out;
+}
+
+bool haveXmllint() {
+    return std::system("xmllint --version >/dev/null 2>&1") == 0;
+}
+
+LintResult xmllint(const std::string& schema, const std::string& file) {
+    const std::string command = "XML_CATALOG_FILES=" + quoted(catalog()) +
+                                " xmllint --nonet --noout --schema " + quoted(schemaFolder() + schema) + " " +
+                                quoted(file) + " 2>&1";
+    LintResult result;
+    FILE* pipe = ::popen(command.c_str(), "r");
+    if (pipe == nullptr)
+        return result;
+    char buffer[4096];
+    std::size_t n;
+    while ((n = std::fread(buffer, 1, sizeof buffer, pipe)) > 0)
+        result.output.append(buffer, n);
+    const int status = ::pclose(pipe);
+    result.exitCode = WIFEXITED(status) ? WEXITSTATUS(status) : -1;
+    return result;
+}
+
+std::string dataDocument(const std::string& sources) {
+    return "<?xml version=\"1.0\" encoding=\"UTF-8\" standalone=\"no\"?> \n"
+           "<gs:graphSources xmlns=\"http://plotaid.org/grxml\" "
+           "xmlns:xsi=\"http://www.w3.org/2001/XMLSchema-instance\"\n"
+           "xmlns:gs=\"http://plotaid.org/grxml/data\" "
+           "xsi:schemaLocation=\"http://plotaid.org/grxml/data "
+           "http://plotaid.org/grxml/data/grxml-data-2.1.xsd\">\n" +
+           sources + "</gs:graphSources>\n";
+}
+
+} // namespace grammar_test
