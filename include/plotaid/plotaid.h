@@ -6,5 +6,7 @@
 #include <plotaid/ChartKey.h>
 #include <plotaid/TimeConverter.h>
 #include <plotaid/TimeStamp.h>
+#include <plotaid/VarDataProcessor.h>
+#include <plotaid/XmlDataHandler.h>
 
 #endif

@@ -1,0 +1,524 @@
+#include <plotaid/XmlDataHandler.h>
+
+#include <plotaid/VarDataProcessor.h>
+
+#include "data/Numbers.h"
+#include "data/Report.h"
+#include "data/StoreAccess.h"
+#include "data/XmlText.h"
+
+#include <zpack/zpack.h>
+
+#include <algorithm>
+#include <cstring>
+#include <memory>
+#include <string_view>
+#include <unordered_map>
+
+using plotaid::detail::kXmlDataFile;
+using plotaid::detail::reportDataError;
+
+namespace {
+
+using Access = plotaid::detail::StoreAccess;
+using Column = VarDataProcessor::_column;
+using Bag = VarDataProcessor::_sourcebag;
+constexpr auto npos = std::string_view::npos;
+
+constexpr std::string_view kHead = "<?xml version=\"1.0\" encoding=\"UTF-8\" standalone=\"no\"?> \n"
+                                   "<gs:graphSources xmlns=\"http://plotaid.org/grxml\" "
+                                   "xmlns:xsi=\"http://www.w3.org/2001/XMLSchema-instance\"\n"
+                                   "xmlns:gs=\"http://plotaid.org/grxml/data\" "
+                                   "xsi:schemaLocation=\"http://plotaid.org/grxml/data "
+                                   "http://plotaid.org/grxml/data/grxml-data-2.1.xsd\">\n";
+constexpr std::string_view kTail = "</gs:graphSources>\n";
+
+constexpr std::string_view kSourceOpen = "<embeddedSource id=\"";
+constexpr std::string_view kSourceClose = "</embeddedSource>";
+constexpr std::string_view kOldSourceOpen = "<source id=\"";
+constexpr std::string_view kOldSourceClose = "</source>";
+constexpr std::string_view kOldValueOpen = "<dataValue name=\"";
+constexpr std::string_view kRowOpen = "<row>";
+constexpr std::string_view kRowClose = "</row>";
+constexpr std::string_view kNamesOpen = "<names>";
+
+// Rows of the XML form are sparse: a few bytes of text can claim a row far down, and every variable
+// of its data source then grows to it. The arrays a text may cost are bounded by its length.
+constexpr unsigned long long kAllocationFloor = 256ull << 20;
+constexpr unsigned long long kAllocationPerTextByte = 32;
+
+bool isOldForm(std::string_view xml) {
+    return xml.find("grxml-1.4.xsd") != npos || xml.find("grxml-data-1.0.xsd") != npos;
+}
+
+std::string_view::size_type findBefore(std::string_view text, std::string_view what, std::size_t from,
+                                       std::size_t end) {
+    const std::size_t at = text.find(what, from);
+    return at == npos || at + what.size() > end ? npos : at;
+}
+
+unsigned countRows(std::string_view text, std::size_t from, std::size_t end) {
+    unsigned rows = 0;
+    for (std::size_t at = findBefore(text, kRowOpen, from, end); at != npos && rows < UINT_MAX;
+         at = findBefore(text, kRowOpen, at + kRowOpen.size(), end))
+        ++rows;
+    return rows;
+}
+
+std::string extractName(std::string_view text, std::size_t from) {
+    const std::size_t quote = text.find('"', from);
+    if (quote == npos)
+        return std::string();
+    return plotaid::detail::unescape(text.substr(from, quote - from));
+}
+
+std::string_view trimmed(std::string_view field) {
+    const char* blanks = " \t\r\n\v\f";
+    const std::size_t first = field.find_first_not_of(blanks);
+    if (first == npos)
+        return std::string_view();
+    return field.substr(first, field.find_last_not_of(blanks) - first + 1);
+}
+
+// Fills one data source of the store from the text, straight into its records.
+class SourceFiller {
+public:
+    SourceFiller(VarDataProcessor& store, const std::string& source, unsigned long long& budget)
+        : store_(store), source_(source), budget_(budget) {}
+
+    // Makes room for rows before any value is set, so that no array moves while the rows are read.
+    bool prepare(unsigned rows) {
+        auto& sources = Access::sources(store_);
+        auto it = sources.find(source_);
+        if (it == sources.end())
+            return false;
+        bag_ = &it->second;
+        if (rows <= bag_->capacity)
+            return true;
+        const unsigned grown = plotaid::detail::grownCapacity(bag_->capacity, rows);
+        if (!take(static_cast<unsigned long long>(grown - bag_->capacity) * bag_->variables.size()))
+            return false;
+        return Access::reallocBag(store_, *bag_, rows);
+    }
+
+    Column* column(const std::string& variable) {
+        auto it = bag_->variables.find(variable);
+        if (it != bag_->variables.end())
+            return &it->second;
+        if (!take(bag_->capacity) || !store_.AddVariable(source_, variable, nullptr))
+            return nullptr;
+        return &bag_->variables.find(variable)->second;
+    }
+
+    // A field as the data forms hold it: a number, or else a string value.
+    bool set(Column* column, const std::string& variable, unsigned row, std::string_view field) {
+        field = trimmed(field);
+        if (field.empty() || field.front() == '<')
+            return true;
+        double value = 0;
+        if (plotaid::detail::parseNumber(field.data(), field.data() + field.size(), value)) {
+            column->values[row] = value;
+            column->rowCount = std::max(column->rowCount, row + 1);
+            return true;
+        }
+        return setString(column, variable, row, plotaid::detail::unescape(field));
+    }
+
+    bool failed() const { return failed_; }
+    void fail() { failed_ = true; }
+
+private:
+    bool take(unsigned long long cells) {
+        const unsigned long long bytes = cells * sizeof(double);
+        if (bytes > budget_) {
+            failed_ = true;
+            return false;
+        }
+        budget_ -= bytes;
+        return true;
+    }
+
+    bool setString(Column* column, const std::string& variable, unsigned row, std::string text) {
+        auto& maps = Access::stringMaps(store_)[source_];
+        VarDataProcessor::StringMap& map = maps[variable];
+        auto& strings = Access::strings(store_);
+        auto at = map.find(row);
+        if (at != map.end() && at->second != VarDataProcessor::NoString)
+            Access::removeString(store_, at->second);
+        // The table's own look-up is a linear scan; a text of many strings needs a hash.
+        unsigned index = 0;
+        auto known = index_.find(text);
+        if (known != index_.end() && known->second < strings.size() && strings[known->second].refCount > 0 &&
+            strings[known->second].text == text) {
+            index = known->second;
+            ++strings[index].refCount;
+        } else {
+            index = static_cast<unsigned>(strings.size());
+            strings.push_back({text, 1});
+            index_[std::move(text)] = index;
+        }
+        map[row] = index;
+        column->rowCount = std::max(column->rowCount, row + 1);
+        return true;
+    }
+
+    VarDataProcessor& store_;
+    const std::string& source_;
+    unsigned long long& budget_;
+    Bag* bag_ = nullptr;
+    bool failed_ = false;
+    std::unordered_map<std::string, unsigned> index_;
+};
+
+void processRow(SourceFiller& filler, const std::vector<std::string>& names, std::vector<Column*>& columns,
+                unsigned row, std::string_view text) {
+    std::size_t start = 0;
+    for (std::size_t i = 0; i < names.size() && start <= text.size(); ++i) {
+        std::size_t end = text.find(';', start);
+        if (end == npos)
+            end = text.size();
+        const std::string_view field = text.substr(start, end - start);
+        start = end + 1;
+        if (trimmed(field).empty())
+            continue;
+        if (!columns[i] && !(columns[i] = filler.column(names[i])))
+            return;
+        filler.set(columns[i], names[i], row, field);
+    }
+}
+
+void processOldRow(SourceFiller& filler, std::unordered_map<std::string, Column*>& columns, unsigned row,
+                   std::string_view text) {
+    std::size_t at = text.find(kOldValueOpen);
+    while (at != npos) {
+        const std::size_t nameStart = at + kOldValueOpen.size();
+        const std::size_t quote = text.find('"', nameStart);
+        if (quote == npos)
+            return;
+        const std::size_t close = text.find('>', quote);
+        if (close == npos)
+            return;
+        const std::size_t valueEnd = std::min(text.find('<', close + 1), text.size());
+        const std::string_view value = text.substr(close + 1, valueEnd - close - 1);
+        at = text.find(kOldValueOpen, valueEnd);
+        if (trimmed(value).empty())
+            continue;
+        const std::string name = plotaid::detail::unescape(text.substr(nameStart, quote - nameStart));
+        Column*& column = columns[name];
+        if (!column && !(column = filler.column(name)))
+            return;
+        filler.set(column, name, row, value);
+    }
+}
+
+std::vector<std::string> splitNames(std::string_view list) {
+    std::vector<std::string> names;
+    if (list.empty())
+        return names;
+    std::size_t start = 0;
+    for (;;) {
+        const std::size_t end = list.find(';', start);
+        names.push_back(plotaid::detail::unescape(list.substr(start, end == npos ? npos : end - start)));
+        if (end == npos)
+            return names;
+        start = end + 1;
+    }
+}
+
+// Reads every data source of either form into the store; false when the text costs more memory
+// than it can justify.
+bool fillStore(VarDataProcessor& store, std::string_view text, bool oldForm) {
+    const std::string_view open = oldForm ? kOldSourceOpen : kSourceOpen;
+    const std::string_view close = oldForm ? kOldSourceClose : kSourceClose;
+    unsigned long long budget = kAllocationFloor + kAllocationPerTextByte * text.size();
+    for (std::size_t at = text.find(open); at != npos; at = text.find(open, at + 1)) {
+        const std::string source = extractName(text, at + open.size());
+        std::size_t end = text.find(close, at);
+        if (end == npos)
+            end = text.size();
+        const unsigned rows = countRows(text, at, end);
+        store.AddDataSource(source, rows);
+        SourceFiller filler(store, source, budget);
+        if (!filler.prepare(rows))
+            return false;
+
+        std::vector<std::string> names;
+        if (!oldForm) {
+            const std::size_t list = findBefore(text, kNamesOpen, at, end);
+            if (list != npos) {
+                const std::size_t from = list + kNamesOpen.size();
+                const std::size_t to = std::min(text.find('<', from), end);
+                names = splitNames(text.substr(from, to - from));
+            }
+        }
+        std::vector<Column*> columns(names.size(), nullptr);
+        std::unordered_map<std::string, Column*> oldColumns;
+        std::size_t row = findBefore(text, kRowOpen, at, end);
+        for (unsigned r = 0; r < rows && row != npos; ++r) {
+            const std::size_t from = row + kRowOpen.size();
+            if (oldForm) {
+                const std::size_t to = std::min(text.find(kRowClose, from), end);
+                processOldRow(filler, oldColumns, r, text.substr(from, to - from));
+            } else {
+                // Fields hold no '<' (the writer escapes it), so the first one ends the row.
+                const std::size_t to = std::min(text.find('<', from), end);
+                processRow(filler, names, columns, r, text.substr(from, to - from));
+            }
+            if (filler.failed())
+                return false;
+            row = findBefore(text, kRowOpen, from, end);
+        }
+    }
+    return true;
+}
+
+bool isCompressed(const std::string& text) {
+    return !text.empty() && static_cast<unsigned char>(text[0]) == 0x78;
+}
+
+} // namespace
+
+XmlDataHandler::XmlDataHandler(const std::string& xml) : xmlText(&xml) {}
+
+XmlDataHandler::XmlDataHandler(const unsigned char* data, unsigned length)
+    : xmlText(&ownText), stream(data), streamLength(data ? length : 0) {}
+
+// A copy made from a stream must point at its own empty text, not at the original's.
+XmlDataHandler::XmlDataHandler(const XmlDataHandler& other)
+    : xmlText(other.xmlText == &other.ownText ? &ownText : other.xmlText), ownText(other.ownText),
+      stream(other.stream), streamLength(other.streamLength) {}
+
+XmlDataHandler& XmlDataHandler::operator=(const XmlDataHandler& other) {
+    if (this != &other) {
+        ownText = other.ownText;
+        xmlText = other.xmlText == &other.ownText ? &ownText : other.xmlText;
+        stream = other.stream;
+        streamLength = other.streamLength;
+    }
+    return *this;
+}
+
+XmlDataHandler::~XmlDataHandler() = default;
+
+bool XmlDataHandler::GetXmlData(std::string& out, bool compressed) {
+    try {
+        const std::string& text = *xmlText;
+        if (text.empty()) {
+            if (stream && streamLength > 0)
+                return BuildXmlData(out, compressed);
+            return false;
+        }
+        if (compressed && !isCompressed(text)) {
+            std::string packed;
+            if (!zpack::compressString(text, packed)) {
+                reportDataError("cannot compress the XML data", kXmlDataFile, __LINE__);
+                return false;
+            }
+            out.swap(packed);
+            return true;
+        }
+        if (!compressed && isCompressed(text)) {
+            std::string plain;
+            if (!zpack::decompressString(plain, text)) {
+                reportDataError("cannot decompress the XML data", kXmlDataFile, __LINE__);
+                return false;
+            }
+            out.swap(plain);
+            return true;
+        }
+        out = text;
+        return true;
+    } catch (...) {
+        reportDataError("cannot make the XML data", kXmlDataFile, __LINE__);
+        return false;
+    }
+}
+
+unsigned char* XmlDataHandler::GetDataStream(unsigned& length) {
+    length = 0;
+    try {
+        const std::string& text = *xmlText;
+        if (!text.empty()) {
+            if (!isCompressed(text))
+                return BuildDataStream(text, length);
+            std::string plain;
+            if (!zpack::decompressString(plain, text)) {
+                reportDataError("cannot decompress the XML data", kXmlDataFile, __LINE__);
+                return nullptr;
+            }
+            return BuildDataStream(plain, length);
+        }
+        if (stream && streamLength > 0) {
+            auto* copy = new unsigned char[streamLength];
+            std::memcpy(copy, stream, streamLength);
+            length = streamLength;
+            return copy;
+        }
+        return nullptr;
+    } catch (...) {
+        length = 0;
+        reportDataError("cannot make the data stream", kXmlDataFile, __LINE__);
+        return nullptr;
+    }
+}
+
+bool XmlDataHandler::BuildXmlData(std::string& out, bool compress) {
+    using plotaid::detail::EscapeKind;
+    VarDataProcessor store;
+    if (!store.ReadStreamData(const_cast<unsigned char*>(stream), streamLength))
+        return false;
+
+    const auto& sources = Access::sources(store);
+    const auto& stringMaps = Access::stringMaps(store);
+    const auto& strings = Access::strings(store);
+    std::string work;
+    std::string& doc = compress ? work : out;
+    doc.clear();
+    unsigned long long expected = 4096;
+    for (const auto& [name, bag] : sources)
+        expected += 20ull * bag.variables.size() * store.GetRowCount(name) + 40 * bag.variables.size();
+    doc.reserve(static_cast<std::size_t>(std::min<unsigned long long>(expected, 1ull << 30)));
+
+    doc.append(kHead);
+    for (const auto& [name, bag] : sources) {
+        doc.append("\t<embeddedSource id=\"");
+        plotaid::detail::appendEscaped(doc, name, EscapeKind::SourceName);
+        doc.append("\">\n\t\t<names>");
+        // Per variable: its cells and, walked in step with the rows, its string values.
+        struct Walk {
+            const double* cells;
+            VarDataProcessor::StringMap::const_iterator next, end;
+        };
+        std::vector<Walk> walks;
+        auto maps = stringMaps.find(name);
+        bool first = true;
+        for (const auto& [variable, column] : bag.variables) {
+            if (!first)
+                doc += ';';
+            first = false;
+            plotaid::detail::appendEscaped(doc, variable, EscapeKind::VariableName);
+            Walk w{column.values, {}, {}};
+            if (maps != stringMaps.end()) {
+                auto m = maps->second.find(variable);
+                if (m != maps->second.end()) {
+                    w.next = m->second.begin();
+                    w.end = m->second.end();
+                }
+            }
+            walks.push_back(w);
+        }
+        doc.append("</names>\n\t\t<types>");
+        for (std::size_t i = 0; i < walks.size(); ++i)
+            doc.append(i == 0 ? "string" : ";string");
+        doc.append("</types>\n");
+        if (walks.empty())
+            doc.append("\t\t<row/>\n");
+        const unsigned rows = store.GetRowCount(name);
+        for (unsigned r = 0; r < rows; ++r) {
+            doc.append("\t\t<row>");
+            for (std::size_t i = 0; i < walks.size(); ++i) {
+                if (i > 0)
+                    doc += ';';
+                Walk& w = walks[i];
+                while (w.next != w.end && w.next->first < r)
+                    ++w.next;
+                if (w.next != w.end && w.next->first == r && w.next->second < strings.size())
+                    plotaid::detail::appendEscaped(doc, strings[w.next->second].text, EscapeKind::Value);
+                else
+                    plotaid::detail::appendCell(doc, w.cells[r]);
+            }
+            doc.append("</row>\n");
+        }
+        doc.append("\t</embeddedSource>\n");
+    }
+    doc.append(kTail);
+
+    if (compress && !zpack::compressString(work, out)) {
+        reportDataError("cannot compress the XML data", kXmlDataFile, __LINE__);
+        return false;
+    }
+    return true;
+}
+
+unsigned char* XmlDataHandler::BuildDataStream(const std::string& xml, unsigned& length) {
+    length = 0;
+    if (isOldForm(xml))
+        return Build_1_4_DataStream(xml, length);
+    if (xml.find(kSourceOpen) == npos)
+        return nullptr;
+    VarDataProcessor store;
+    if (!fillStore(store, xml, false)) {
+        reportDataError("the XML data claim more rows than their text holds", kXmlDataFile, __LINE__);
+        return nullptr;
+    }
+    return store.GetDataStream(length);
+}
+
+unsigned char* XmlDataHandler::Build_1_4_DataStream(const std::string& xml, unsigned& length) {
+    length = 0;
+    if (xml.find(kOldSourceOpen) == npos)
+        return nullptr;
+    VarDataProcessor store;
+    if (!fillStore(store, xml, true)) {
+        reportDataError("the XML data claim more rows than their text holds", kXmlDataFile, __LINE__);
+        return nullptr;
+    }
+    return store.GetDataStream(length);
+}
+
+unsigned XmlDataHandler::CountRows(const char* at) {
+    if (!at)
+        return 0;
+    const std::string_view text(at);
+    const std::size_t end = std::min(text.find(kSourceClose), text.size());
+    return countRows(text, 0, end);
+}
+
+unsigned XmlDataHandler::Count_1_4_Rows(const char* at) {
+    if (!at)
+        return 0;
+    const std::string_view text(at);
+    const std::size_t end = std::min(text.find(kOldSourceClose), text.size());
+    return countRows(text, 0, end);
+}
+
+bool XmlDataHandler::ExtractName(const char* at, std::string& name) {
+    name.clear();
+    if (!at)
+        return false;
+    const std::string_view text(at);
+    if (text.find('"') == npos)
+        return false;
+    name = extractName(text, 0);
+    return true;
+}
+
+void XmlDataHandler::ProcessRow(VarDataProcessor& store, const std::string& source,
+                                const std::vector<std::string>& names, unsigned row, const char* at) {
+    if (!at || row == UINT_MAX)
+        return;
+    std::string_view text(at);
+    if (text.substr(0, kRowOpen.size()) == kRowOpen)
+        text.remove_prefix(kRowOpen.size());
+    text = text.substr(0, std::min(text.find('<'), text.size()));
+    unsigned long long budget = kAllocationFloor;
+    SourceFiller filler(store, source, budget);
+    if (!filler.prepare(row + 1))
+        return;
+    std::vector<Column*> columns(names.size(), nullptr);
+    processRow(filler, names, columns, row, text);
+}
+
+void XmlDataHandler::Process_1_4_Row(VarDataProcessor& store, const std::string& source, unsigned row,
+                                     const char* at) {
+    if (!at || row == UINT_MAX)
+        return;
+    std::string_view text(at);
+    text = text.substr(0, std::min(text.find(kRowClose), text.size()));
+    unsigned long long budget = kAllocationFloor;
+    SourceFiller filler(store, source, budget);
+    if (!filler.prepare(row + 1))
+        return;
+    std::unordered_map<std::string, Column*> columns;
+    processOldRow(filler, columns, row, text);
+}
