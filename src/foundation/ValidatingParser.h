@@ -1,0 +1,69 @@
+#ifndef PLOTAID_FOUNDATION_VALIDATINGPARSER_H
+#define PLOTAID_FOUNDATION_VALIDATINGPARSER_H
+
+#include <plotaid/ChartException.h>
+
+#include <xercesc/util/XercesDefs.hpp>
+
+#include <cstddef>
+#include <memory>
+#include <string>
+#include <string_view>
+#include <vector>
+
+XERCES_CPP_NAMESPACE_BEGIN
+class DOMDocument;
+XERCES_CPP_NAMESPACE_END
+
+namespace plotaid::detail {
+
+// Releases a document that its holder owns. Xerces-C must still be up (hold a XercesRuntime).
+struct DocumentRelease {
+    void operator()(XERCES_CPP_NAMESPACE::DOMDocument* document) const noexcept;
+};
+using OwnedDocument = std::unique_ptr<XERCES_CPP_NAMESPACE::DOMDocument, DocumentRelease>;
+
+// The library's one way to parse XML. The parser always validates (namespaces and schemas on,
+// ignorable white space dropped), reads schemas and other entities only from the resource folder
+// through ChartErrorHandler, limits entity expansion, and lets values of a wrong data type pass:
+// any other warning or error stops the parse. It keeps Xerces-C up while it lives.
+//
+//   ValidatingParser parser;
+//   if (DOMDocument* doc = parser.parse(text, "ChartBase", ChartException("...", file, line)))
+//       use(doc);                          // owned by the parser until its next parse
+//   OwnedDocument mine = parser.adoptDocument(); // or take it over
+class ValidatingParser {
+public:
+    // At most this many entity references are expanded in one document, ...
+    static constexpr std::size_t kEntityExpansionLimit = 5000;
+    // ... and no internal entity may hold a longer replacement text, which bounds what expansion
+    // can produce at a few tens of megabytes.
+    static constexpr std::size_t kEntityValueLimit = 2048;
+
+    ValidatingParser();
+    ~ValidatingParser();
+    ValidatingParser(const ValidatingParser&) = delete;
+    ValidatingParser& operator=(const ValidatingParser&) = delete;
+
+    // Parses the bytes of text (read in place, not copied); systemId names the text in reports.
+    // Returns the document, which belongs to this parser until its next parse or adoptDocument().
+    // On failure returns null after dumping the text as parseError_00.xml (dump kind 9) and
+    // logging `failure`; lastErrors() then says why.
+    XERCES_CPP_NAMESPACE::DOMDocument* parse(std::string_view text, const char* systemId,
+                                             const ChartException& failure);
+
+    // Hands the document of the last successful parse to the caller; null when there is none.
+    OwnedDocument adoptDocument();
+
+    // The texts (host encoding) of what stopped the last parse, such as
+    // "ChartBase:3:7: no declaration found for element 'bogus'"; empty after a successful parse.
+    const std::vector<std::string>& lastErrors() const noexcept;
+
+private:
+    struct Impl;
+    std::unique_ptr<Impl> impl_;
+};
+
+} // namespace plotaid::detail
+
+#endif
