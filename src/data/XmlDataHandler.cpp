@@ -10,6 +10,7 @@
 #include <zpack/zpack.h>
 
 #include <algorithm>
+#include <cctype>
 #include <cstring>
 #include <memory>
 #include <string_view>
@@ -70,6 +71,48 @@ std::string extractName(std::string_view text, std::size_t from) {
     if (quote == npos)
         return std::string();
     return plotaid::detail::unescape(text.substr(from, quote - from));
+}
+
+// The position just past a character or entity reference at text[amp] == '&', or npos.
+std::size_t referenceEnd(std::string_view text, std::size_t amp) {
+    std::size_t i = amp + 1;
+    const bool numeric = i < text.size() && text[i] == '#';
+    if (numeric)
+        ++i;
+    const bool hex = numeric && i < text.size() && (text[i] == 'x' || text[i] == 'X');
+    if (hex)
+        ++i;
+    const std::size_t first = i;
+    while (i < text.size() && i - first < 10) {
+        const char c = text[i];
+        const bool ok = numeric ? (std::isdigit(static_cast<unsigned char>(c)) ||
+                                   (hex && std::isxdigit(static_cast<unsigned char>(c))))
+                                : std::isalnum(static_cast<unsigned char>(c)) != 0;
+        if (!ok)
+            break;
+        ++i;
+    }
+    return i > first && i < text.size() && text[i] == ';' ? i + 1 : npos;
+}
+
+// The end of the field that starts at start: the next ';' that does not close a reference (the
+// writer's escapes hold semicolons of their own).
+std::size_t fieldEnd(std::string_view text, std::size_t start) {
+    std::size_t semi = text.find(';', start);
+    for (;;) {
+        if (semi == npos)
+            return text.size();
+        const std::size_t amp = text.substr(0, semi).find('&', start);
+        if (amp == npos)
+            return semi;
+        const std::size_t ref = referenceEnd(text, amp);
+        if (ref != npos && ref - 1 >= semi) {
+            start = ref;
+            semi = text.find(';', start);
+        } else {
+            start = amp + 1;
+        }
+    }
 }
 
 std::string_view trimmed(std::string_view field) {
@@ -174,9 +217,7 @@ void processRow(SourceFiller& filler, const std::vector<std::string>& names, std
                 unsigned row, std::string_view text) {
     std::size_t start = 0;
     for (std::size_t i = 0; i < names.size() && start <= text.size(); ++i) {
-        std::size_t end = text.find(';', start);
-        if (end == npos)
-            end = text.size();
+        const std::size_t end = fieldEnd(text, start);
         const std::string_view field = text.substr(start, end - start);
         start = end + 1;
         if (trimmed(field).empty())
@@ -217,9 +258,9 @@ std::vector<std::string> splitNames(std::string_view list) {
         return names;
     std::size_t start = 0;
     for (;;) {
-        const std::size_t end = list.find(';', start);
-        names.push_back(plotaid::detail::unescape(list.substr(start, end == npos ? npos : end - start)));
-        if (end == npos)
+        const std::size_t end = fieldEnd(list, start);
+        names.push_back(plotaid::detail::unescape(list.substr(start, end - start)));
+        if (end == list.size())
             return names;
         start = end + 1;
     }
