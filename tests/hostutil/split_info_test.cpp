@@ -1,0 +1,225 @@
+#include "TempDir.h"
+
+#include <feed/memory.h>
+#include <kovar/kovarconv.h>
+#include <msgbook/FacSTDictionary.h>
+#include <plotaid/splitInfo.h>
+
+#include <gtest/gtest.h>
+
+#include <filesystem>
+#include <fstream>
+#include <memory>
+#include <stdexcept>
+
+namespace {
+
+// A resource folder whose blank-value message is known, so the tests do not depend on the
+// shipped wording.
+class SplitInfo : public ::testing::Test {
+protected:
+    SplitInfo() {
+        std::filesystem::create_directories(dir.path() + "/messages");
+        std::ofstream(dir.path() + "/messages/common.en.txt") << "E60712\t<blank>\n";
+        region = source.addVariable("region", "Sales region", Kovar_Format(5, 8, 0));
+        city = source.addVariable("city", "", Kovar_Format(1, 12, 0));
+        amount = source.addVariable("amount", "Amount paid", Kovar_Format(5, 8, 2));
+        source.setSplitVariables({region, city});
+    }
+
+    TempDir dir;
+    ScopedEnv resources{"PLOTAID_RESOURCE_DIR", dir.path().c_str()};
+    feed::MemoryDataSource source;
+    feed::MemoryCase cases;
+    int region = 0, city = 0, amount = 0;
+};
+
+} // namespace
+
+TEST_F(SplitInfo, LabelListsEachSplitVariableWithItsValue) {
+    source.variable(region).valueLabels().add(2.0, "North");
+    cases.setNumber(region, 2.0);
+    cases.setText(city, "Oslo");
+    splitInfo info;
+    EXPECT_TRUE(info.saveSplitInfo(&cases, &source));
+    EXPECT_EQ(info.getSplitLabel(true), "region = North, city = Oslo");
+    // Without a label of its own, the variable shows its name.
+    EXPECT_EQ(info.getSplitLabel(false), "Sales region = North, city = Oslo");
+}
+
+TEST_F(SplitInfo, ValueTextsOfNumbers) {
+    source.setSplitVariables({amount});
+    source.variable(amount).addMissingValue(-9.0);
+    splitInfo info;
+    cases.setNumber(amount, 1234.5);
+    info.saveSplitInfo(&cases, &source);
+    EXPECT_EQ(info.getSplitLabel(true), "amount = 1234.50"); // printed, blanks trimmed
+
+    cases.setNumber(amount, kovar::kMissingValue);
+    info.saveSplitInfo(&cases, &source);
+    EXPECT_EQ(info.getSplitLabel(true), "amount = <blank>");
+
+    cases.setNumber(amount, -9.0); // user-missing
+    info.saveSplitInfo(&cases, &source);
+    EXPECT_EQ(info.getSplitLabel(true), "amount = <blank>");
+
+    // A value label wins over the missing-value text.
+    source.variable(amount).valueLabels().add(-9.0, "Refused");
+    info.saveSplitInfo(&cases, &source);
+    EXPECT_EQ(info.getSplitLabel(true), "amount = Refused");
+}
+
+TEST_F(SplitInfo, ValueTextsOfTexts) {
+    source.setSplitVariables({city});
+    splitInfo info;
+    cases.setText(city, "    ");
+    info.saveSplitInfo(&cases, &source);
+    EXPECT_EQ(info.getSplitLabel(true), "city = <blank>");
+
+    // Only as many characters as the width, trailing blanks removed, leading kept.
+    cases.setText(city, "  Rio de Janeiro");
+    info.saveSplitInfo(&cases, &source);
+    EXPECT_EQ(info.getSplitLabel(true), "city =   Rio de Jan");
+
+    source.variable(city).valueLabels().add("  Rio de Jan", "Rio");
+    info.saveSplitInfo(&cases, &source);
+    EXPECT_EQ(info.getSplitLabel(true), "city = Rio");
+}
+
+TEST_F(SplitInfo, TextShorterInTheCaseThanItsWidthIsReadOnlyAsFarAsItGoes) {
+    const int wide = source.addVariable("note", "", Kovar_Format(1, 200, 0));
+    source.setSplitVariables({wide});
+    cases.setText(wide, "short"); // one cell, though the format claims 200 characters
+    splitInfo info;
+    info.saveSplitInfo(&cases, &source);
+    EXPECT_EQ(info.getSplitLabel(true), "note = short");
+}
+
+TEST_F(SplitInfo, SecondTypeOfTextIsReadAsCharactersToo) {
+    const int code = source.addVariable("code", "", Kovar_Format(2, 4, 0));
+    source.setSplitVariables({code});
+    cases.setText(code, "AB12");
+    splitInfo info;
+    info.saveSplitInfo(&cases, &source);
+    EXPECT_EQ(info.getSplitLabel(true), "code = AB12");
+}
+
+TEST_F(SplitInfo, MessageComesFromTheHostLanguageWithEnglishFallback) {
+    std::ofstream(dir.path() + "/messages/common.de.txt") << "E60712\tfehlt\n";
+    source.setSplitVariables({city});
+    cases.setText(city, "");
+    const std::string before = msgbook::hostLanguage();
+    msgbook::setHostLanguage("de");
+    splitInfo german;
+    msgbook::setHostLanguage("fr");
+    splitInfo french;
+    msgbook::setHostLanguage(before);
+    german.saveSplitInfo(&cases, &source);
+    french.saveSplitInfo(&cases, &source);
+    EXPECT_EQ(german.getSplitLabel(true), "city = fehlt");
+    EXPECT_EQ(french.getSplitLabel(true), "city = <blank>");
+}
+
+TEST_F(SplitInfo, UnreadableSplitVariablesAreSkipped) {
+    source.setSplitVariables({region, 99, -1, city, amount});
+    cases.setNumber(region, 1.0);
+    cases.setText(city, "Bergen");
+    // amount has no value in the case
+    splitInfo info;
+    EXPECT_TRUE(info.saveSplitInfo(&cases, &source));
+    EXPECT_EQ(info.getSplitLabel(true), "region = 1, city = Bergen");
+
+    splitInfo withoutCases;
+    EXPECT_TRUE(withoutCases.saveSplitInfo(nullptr, &source));
+    EXPECT_EQ(withoutCases.getSplitLabel(true), "");
+}
+
+namespace {
+// A variable whose host implementation fails.
+class ThrowingVariable final : public feed::Kovar_Variable {
+public:
+    std::string GetName() const override { throw std::runtime_error("host failure"); }
+    std::string GetLabel() const override { return ""; }
+    Kovar_Format GetFormat() const override { return Kovar_Format(5, 8, 0); }
+    const feed::Kovar_ValueLabelMap* GetValueLabels() const override { return nullptr; }
+    int IsMissing(double) const override { return 0; }
+};
+
+class PartlyFailingSource final : public feed::ProcedureDataSource {
+public:
+    explicit PartlyFailingSource(const feed::MemoryDataSource& inner) : inner_(inner) {}
+    int GetVariableCount() const override { return inner_.GetVariableCount() + 1; }
+    const feed::Kovar_Variable* GetVariable(int index) const override {
+        return index == 7 ? &broken_ : inner_.GetVariable(index);
+    }
+    int GetSplitVariableCount() const override { return 2; }
+    int GetSplitVariableIndex(int i) const override { return i == 0 ? 7 : 0; }
+    bool UsesSplitHeading(const feed::BpProcedure&) const override { return true; }
+
+private:
+    const feed::MemoryDataSource& inner_;
+    ThrowingVariable broken_;
+};
+} // namespace
+
+TEST_F(SplitInfo, HostFailureOnOneVariableCostsOnlyThatVariable) {
+    PartlyFailingSource failing(source);
+    cases.setNumber(7, 1.0);
+    cases.setNumber(region, 3.0);
+    splitInfo info;
+    EXPECT_TRUE(info.saveSplitInfo(&cases, &failing));
+    EXPECT_EQ(info.getSplitLabel(true), "region = 3");
+}
+
+TEST_F(SplitInfo, NewCaseReplacesTheEntriesAndNullSourceKeepsThem) {
+    splitInfo info;
+    EXPECT_EQ(info.getSplitLabel(true), "");
+    cases.setNumber(region, 1.0);
+    cases.setText(city, "A");
+    info.saveSplitInfo(&cases, &source);
+    cases.setNumber(region, 2.0);
+    cases.setText(city, "B");
+    info.saveSplitInfo(&cases, &source);
+    EXPECT_EQ(info.getSplitLabel(true), "region = 2, city = B");
+
+    feed::BpProcedure graph("GRAPH");
+    EXPECT_TRUE(info.saveSplitInfo(&cases, nullptr));
+    EXPECT_EQ(info.getSplitLabel(true), "region = 2, city = B");
+    EXPECT_EQ(info.activateSplit(graph), nullptr);
+}
+
+TEST_F(SplitInfo, HeadingCarriesEachVariableAndItsRawValue) {
+    feed::BpProcedure graph("GRAPH");
+    splitInfo info;
+    EXPECT_EQ(info.activateSplit(graph), nullptr); // before any saveSplitInfo
+
+    source.variable(region).valueLabels().add(2.0, "North");
+    cases.setNumber(region, 2.0);
+    cases.setText(city, "Oslo");
+    info.saveSplitInfo(&cases, &source);
+    std::unique_ptr<feed::BpHeading> heading(info.activateSplit(graph));
+    ASSERT_NE(heading, nullptr);
+    EXPECT_EQ(heading->Procedure(), "GRAPH");
+    EXPECT_EQ(heading->Pattern(), "[%1 = %2:, ^1 = ^2:]1");
+    ASSERT_EQ(heading->Parts().size(), 2u);
+    // Show mode 2 gives the label, preference 2 the value label.
+    EXPECT_EQ(heading->Parts()[0], (std::vector<std::string>{"Sales region", "North"}));
+    EXPECT_EQ(heading->Parts()[1], (std::vector<std::string>{"city", "Oslo"}));
+    EXPECT_EQ(heading->Text(), "Sales region = North, city = Oslo");
+
+    source.suppressSplitHeading("FREQUENCIES");
+    feed::BpProcedure frequencies("FREQUENCIES");
+    EXPECT_EQ(info.activateSplit(frequencies), nullptr);
+}
+
+TEST(SplitInfoShipped, BlankValueMessageOfTheSourceTree) {
+    ScopedEnv resources("PLOTAID_RESOURCE_DIR", (std::string(PLOTAID_SOURCE_DIR) + "/resources").c_str());
+    feed::MemoryDataSource source;
+    const int v = source.addVariable("v", "", Kovar_Format(5, 8, 0));
+    source.setSplitVariables({v});
+    feed::MemoryCase cases;
+    cases.setNumber(v, kovar::kMissingValue);
+    splitInfo info;
+    info.saveSplitInfo(&cases, &source);
+    EXPECT_EQ(info.getSplitLabel(false), "v = Missing");
+}
