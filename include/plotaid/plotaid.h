@@ -2,6 +2,8 @@
 #define PLOTAID_PLOTAID_H
 
 // Everything a host needs: one header per exported class.
+#include <plotaid/ChartBase.h>
+#include <plotaid/ChartErrorHandler.h>
 #include <plotaid/ChartException.h>
 #include <plotaid/ChartKey.h>
 #include <plotaid/Kovar_Format.h>
