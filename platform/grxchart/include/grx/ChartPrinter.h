@@ -1,0 +1,29 @@
+#ifndef GRX_CHARTPRINTER_H
+#define GRX_CHARTPRINTER_H
+
+#include <grx/ChartString.h>
+#include <grx/Export.h>
+
+#include <xercesc/dom/DOMDocument.hpp>
+#include <xercesc/dom/DOMNode.hpp>
+
+#include <ostream>
+
+// Writes DOM documents and nodes as XML text. The encoding is the one set here, else the
+// document's declared encoding, else UTF-8. Faults of the serialiser surface as DOMLSException.
+class GRX_API ChartPrinter {
+public:
+    void setPrintWhiteSpace(bool on) { whiteSpace_ = on; }
+    bool getPrintWhiteSpace() const { return whiteSpace_; }
+    // An empty or null name goes back to the document's own choice.
+    void setEncoding(const XMLCh* encoding) { encoding_ = ChartString(encoding); }
+
+    void Print(const xercesc::DOMDocument* document, std::ostream& out) const;
+    void Print(const xercesc::DOMNode* node, std::ostream& out) const;
+
+private:
+    bool whiteSpace_ = false;
+    ChartString encoding_;
+};
+
+#endif

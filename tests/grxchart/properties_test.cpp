@@ -1,0 +1,227 @@
+#include "GrxTestSupport.h"
+
+#include <xercesc/dom/DOMDocument.hpp>
+
+#include <gtest/gtest.h>
+
+using namespace xercesc;
+
+namespace {
+
+class Built : public ::testing::Test {
+protected:
+    Built() : vis(grxtest::newChartDocument()->getDocumentElement(), true) {}
+    GrxVisualization vis;
+};
+
+TEST_F(Built, IdsSetThroughTheLayerAnswerLookups) {
+    DOMDocument* doc = vis.getDOMDocument();
+    GrxStyle& style = vis.addStyle();
+    style.setId(u"s1");
+    EXPECT_EQ(doc->getElementById(u"s1"), style.getImplementation());
+    EXPECT_EQ(vis.getStyleById(u"s1"), &style);
+
+    GrrUviza& graph = vis.addGraph();
+    graph.SetAttribute(GrxUni::_id, u"g1");
+    EXPECT_EQ(doc->getElementById(u"g1"), graph.getImplementation());
+
+    // A renamed id answers under its new name only.
+    style.setId(u"s2");
+    EXPECT_EQ(doc->getElementById(u"s1"), nullptr);
+    EXPECT_EQ(vis.getStyleById(u"s2"), &style);
+
+    // Removing the attribute or the node withdraws the id.
+    graph.removeAttribute(GrxUni::_id);
+    EXPECT_EQ(doc->getElementById(u"g1"), nullptr);
+    vis.removeStyles();
+    EXPECT_FALSE(vis.doesIdExist(u"s2"));
+    EXPECT_EQ(doc->getElementById(u"s2"), nullptr);
+    EXPECT_FALSE(vis.doesIdExist(u""));
+}
+
+TEST_F(Built, ACreatedDocumentGetsItsIdsDeclaredWhenWrapped) {
+    DOMDocument* doc = grxtest::newChartDocument();
+    DOMElement* style = doc->createElementNS(grxtest::kChartNamespace, GrxUni::_style);
+    style->setAttribute(GrxUni::_id, u"plain");
+    doc->getDocumentElement()->appendChild(style);
+    ASSERT_EQ(doc->getElementById(u"plain"), nullptr); // a plain attribute is no ID yet
+    GrxVisualization wrapped(doc->getDocumentElement(), true);
+    EXPECT_EQ(doc->getElementById(u"plain"), style);
+    EXPECT_EQ(wrapped.getStyleById(u"plain"), wrapped.getStyles().at(0));
+}
+
+TEST_F(Built, ReferencesResolveToTheSameWrapper) {
+    GrxStyle& style = vis.addStyle();
+    GrrUviza& graph = vis.addGraph();
+    // The target gets an id of its own when it has none.
+    graph.setStyle(style);
+    EXPECT_FALSE(ChartString(style.getId()).empty());
+    EXPECT_EQ(graph.getStyle(), &style);
+
+    GrxCoordinates& coords = graph.addCoordinates();
+    GrxPoint& point = graph.addPoint();
+    point.setCoordinates(coords);
+    EXPECT_EQ(point.getCoordinates(), &coords);
+
+    GrxStyleCycle& cycle = vis.addStyleCycle(u"styleCycleColor");
+    GrxColor& color = point.addColor();
+    color.setCycle(cycle);
+    EXPECT_EQ(color.getCycle(), &cycle);
+    color.removeCycle();
+    EXPECT_EQ(color.getCycle(), nullptr);
+
+    // A dangling id, or one naming an object of another kind, reads as null.
+    point.SetAttribute(GrxUni::_style, u"nowhere");
+    EXPECT_EQ(point.getStyle(), nullptr);
+    point.SetAttribute(GrxUni::_style, ChartString(coords.getId()));
+    EXPECT_EQ(point.getStyle(), nullptr);
+    EXPECT_EQ(point.referenced(GrxUni::_style), &coords);
+}
+
+TEST_F(Built, CompoundPropertiesKeepThePartsNotGiven) {
+    GrxStyle& style = vis.addStyle();
+    EXPECT_FALSE(style.isFontSizePresent());
+    style.setFontSize(u"8pt", nullptr, nullptr);
+    style.setFontSize(nullptr, u"6pt", nullptr);
+    ChartString pref, min, max;
+    style.getFontSize(&pref, &min, &max);
+    EXPECT_EQ(pref.toUTF8(), "8pt");
+    EXPECT_EQ(min.toUTF8(), "6pt");
+    EXPECT_TRUE(max.empty());
+    EXPECT_TRUE(style.isFontSizePresent());
+
+    // The maximum first, then the preferred width, into the same property.
+    style.setWidth(nullptr, nullptr, u"20px");
+    style.setWidth(u"1pt", nullptr, nullptr);
+    style.getWidth(&pref, &min, &max);
+    EXPECT_EQ(pref.toUTF8(), "1pt");
+    EXPECT_TRUE(min.empty());
+    EXPECT_EQ(max.toUTF8(), "20px");
+    // An empty part clears that part; all empty removes the property.
+    style.setWidth(u"", nullptr, u"");
+    EXPECT_FALSE(style.isWidthPresent());
+
+    // Only the minimum given still reads as a font size.
+    GrxStyle& other = vis.addStyle();
+    other.setFontSize(nullptr, u"7pt", nullptr);
+    EXPECT_TRUE(other.isFontSizePresent());
+    other.getFontSize(&pref, nullptr, nullptr);
+    EXPECT_TRUE(pref.empty());
+
+    GrxStyle::getPreferredMinMax(u" 9pt ; ;12pt;junk", &pref, &min, &max);
+    EXPECT_EQ(pref.toUTF8(), "9pt");
+    EXPECT_TRUE(min.empty());
+    EXPECT_EQ(max.toUTF8(), "12pt");
+    GrxStyle::getPreferredMinMax(nullptr, &pref, nullptr, nullptr);
+    EXPECT_TRUE(pref.empty());
+}
+
+TEST_F(Built, EnumerationsHaveDefinedAbsentValuesAndStableWords) {
+    GrrUviza& graph = vis.addGraph();
+    GrxAxis& axis = graph.addCoordinates().addDimension().addAxis();
+    EXPECT_EQ(axis.getTransform(), 2); // a plain axis is not derived
+    axis.setTransform(1);
+    EXPECT_TRUE(ChartString(axis.GetAttribute(GrxUni::_transform)).equals(u"percent"));
+    EXPECT_EQ(axis.getTransform(), 1);
+
+    GrxLine& line = graph.addLine();
+    EXPECT_EQ(line.getBreakRepresentation(), 0);
+    line.setBreakRepresentation(3);
+    EXPECT_TRUE(ChartString(line.GetAttribute(u"breakRepresentation")).equals(u"wings"));
+
+    EXPECT_EQ(vis.addDerivedVariable().getCategorical(), 0);
+    EXPECT_EQ(axis.addMinorTicks().getNumber(), 2);
+    EXPECT_EQ(axis.addMajorTicks().getLabelFrequency(), 1);
+    EXPECT_EQ(graph.addPoint().addColor().getAffect(), 0);
+    EXPECT_EQ(line.addSmoothStatistic().getKernel(), 0);
+
+    // A number without a word is written in decimal and reads back.
+    GrxScale& scale = vis.getGraphs()[0]->getCoordinatess()[0]->getDimensions()[0]->addScale(4);
+    EXPECT_TRUE(ChartString(scale.GetAttribute(GrxUni::_method)).equals(u"log_safe"));
+    scale.setMethod(42);
+    EXPECT_TRUE(ChartString(scale.GetAttribute(GrxUni::_method)).equals(u"42"));
+    EXPECT_EQ(scale.getMethod(), 42);
+    scale.SetAttribute(GrxUni::_method, u"nonsense");
+    EXPECT_EQ(scale.getMethod(), 1); // unreadable counts as absent
+
+    GrxLocation& loc = vis.addLocation(GrxLocation::part_height);
+    EXPECT_TRUE(ChartString(loc.GetAttribute(u"part")).equals(u"height"));
+    EXPECT_EQ(loc.getPart(), GrxLocation::part_height);
+}
+
+TEST_F(Built, TypedValuesReadBackAndUnreadableOnesFallBack) {
+    GrxMajorTicks& ticks = vis.addGraph().addCoordinates().addDimension().addAxis().addMajorTicks();
+    ticks.setDelta(0.1 + 0.2);
+    EXPECT_EQ(ticks.getDelta(), 0.1 + 0.2); // written so that it reads back exactly
+    ticks.setLabelAngle(-90.0);
+    EXPECT_TRUE(ChartString(ticks.GetAttribute(GrxUni::_labelAngle)).equals(u"-90"));
+    ticks.SetAttribute(GrxUni::_delta, u"auto");
+    EXPECT_EQ(ticks.getDelta(), 0.0);
+    EXPECT_TRUE(ticks.isDeltaPresent());
+    ticks.removeDelta();
+    EXPECT_FALSE(ticks.isDeltaPresent());
+
+    GrxStyle& style = vis.addStyle();
+    EXPECT_TRUE(style.getVisible());
+    style.setVisible(false);
+    EXPECT_FALSE(style.getVisible());
+    style.SetAttribute(GrxUni::_visible, u"hidden");
+    EXPECT_FALSE(style.getVisible());
+    style.setVisible(true);
+    EXPECT_TRUE(ChartString(style.GetAttribute(GrxUni::_visible)).equals(GrxUni::_true));
+
+    CTTextType& text = vis.addLabelFrame().addLabel().addText();
+    text.setText(ChartString("R"));
+    text.setText(ChartString("R\xC2\xB2")); // replaces, does not append
+    EXPECT_EQ(text.getText().toUTF8(), "R\xC2\xB2");
+    EXPECT_TRUE(ChartString(ticks.GetAttribute(u"absent")).empty());
+}
+
+TEST_F(Built, ExtensionSlotsHoldFramesById) {
+    GrxExtensionVis& ext = vis.addExtension();
+    GrxLabelFrame& title = vis.addLabelFrame();
+    GrxLegend& legend = vis.addLegend();
+    ext.setTitle(title, 2);
+    ext.setLegend(legend, 12);
+    EXPECT_EQ(ext.getTitle2(), &title);
+    EXPECT_EQ(ext.getTitle1(), nullptr);
+    EXPECT_EQ(ext.getLegend(12), &legend);
+    EXPECT_EQ(ext.getLegend(11), nullptr);
+    EXPECT_TRUE(ChartString(ext.GetAttribute(u"legend12")).equals(legend.getId()));
+    // A slot naming a frame of another kind reads as null.
+    ext.setAttribute(u"footnote1", legend.getId());
+    EXPECT_EQ(ext.getFootnote(1), nullptr);
+    GrxStyleCycle& cycle = vis.addStyleCycle(u"styleCycleRepository");
+    ext.setStyleCycleRepository(cycle);
+    EXPECT_EQ(vis.getExtension()->getStyleCycleRepository(), &cycle);
+}
+
+TEST_F(Built, RemovalKeepsEarlierPointersUsable) {
+    GrrUviza& graph = vis.addGraph();
+    GrxPoint& point = graph.addPoint();
+    std::vector<GrxColor*> colors;
+    for (int i = 0; i < 3; ++i) {
+        GrxColor& c = point.addColor();
+        c.setId(ChartString("color").appendInteger(i));
+        colors.push_back(&c);
+    }
+    const std::size_t wrappers = vis.wrapperCount();
+    // Walk the list read first, removing as we go, as the dash action does.
+    for (GrxColor* c : point.getColors()) {
+        const ChartString id(c->getId());
+        point.removeColor(*c);
+        GrxDash& dash = point.addDash();
+        dash.setId(id);
+    }
+    EXPECT_TRUE(point.getColors().empty());
+    ASSERT_EQ(point.getDashs().size(), 3u);
+    EXPECT_TRUE(ChartString(point.getDashs()[1]->getId()).equals(u"color1"));
+    EXPECT_TRUE(ChartString(colors[2]->getId()).equals(u"color2"));
+    EXPECT_EQ(vis.wrapperCount(), wrappers + 3);
+    // Removing something that is not our child changes nothing.
+    GrxLine& line = graph.addLine();
+    point.removeChild(line);
+    EXPECT_EQ(graph.getLines().size(), 1u);
+}
+
+} // namespace

@@ -1,0 +1,340 @@
+#include "GrxTestSupport.h"
+
+#include <xercesc/dom/DOMDocument.hpp>
+#include <xercesc/dom/DOMImplementation.hpp>
+#include <xercesc/dom/DOMImplementationRegistry.hpp>
+
+#include <gtest/gtest.h>
+
+#include <sstream>
+
+using namespace xercesc;
+
+namespace {
+
+// A chart built only through the layer, touching every add operation.
+void buildEverything(GrxVisualization& vis) {
+    GrxStyle& container = vis.addStyle();
+    container.setId(u"c-o-n-t-a-i-n-er");
+    GrxStyle& style = container.addStyle();
+    style.setColor(GrxStyle::_black);
+    style.setFontSize(u"8pt", u"6pt", nullptr);
+    style.setFontWeight(2);
+    style.setVisible(true);
+    vis.setStyle(style);
+    GrxStyleCycle& cycle = vis.addStyleCycle(u"styleCycleColor");
+    cycle.addCycle().addStyle().setColor(GrxStyle::_white);
+    cycle.addExtension();
+    GrxExtensionVis& ext = vis.addExtension();
+    ext.setPreserveLocations(false);
+    ext.setAttribute(GrxDrillDown::getElementName(), GrxUni::_true);
+
+    GrxLabelFrame& title = vis.addLabelFrame();
+    title.addLocation(GrxLocation::part_top).setValue(u"2%");
+    GrxLocation& next = title.addLocation(GrxLocation::part_left);
+    next.setMethod(GrxLocation::method_nextTo);
+    next.setTarget(title);
+    next.setMax(u"25%");
+    CTLabelType& label = title.addLabel();
+    label.addText().setText(ChartString("Title"));
+    GrxDescriptionGroup& group = label.addDescriptionGroup();
+    group.setSeparator(u"\n");
+    group.addText().setText(ChartString("N"));
+    GrxDescription& description = group.addDescription();
+    description.setKind(6);
+    description.addFormat().setMaximumFractionDigits(2);
+    ext.setTitle(title, 1);
+    ext.setSubtitle(vis.addLabelFrame());
+    ext.setFootnote(vis.addLabelFrame(), 1);
+    ext.setText(vis.addLabelFrame(), 1);
+    ext.setStatisticsSummary(vis.addLabelFrame(), 1);
+    ext.setKey(vis.addKey(), 1);
+    vis.addControlFrame().addLocation(GrxLocation::part_width);
+    vis.addLocation(GrxLocation::part_height);
+
+    GrxSourceVariable& x = vis.addSourceVariable();
+    x.setSourceName(u"$CASENUM");
+    x.addExtension().setStatistic(1);
+    GrxFormat& format = x.addFormat();
+    format.setBaseFormat(CTFormatType::baseFormat_date);
+    format.setUseGrouping(true);
+    format.addRelabel().setFrom(u"1");
+    format.addUnitRule().setSuffix(u"K");
+    GrxExpressionVariable& expr = vis.addExpressionVariable();
+    expr.setValue(u"a/b");
+    GrxDerivedVariable& derived = vis.addDerivedVariable();
+    derived.setCreator(u"internal_cutVariable");
+    derived.setCategorical(0);
+    x.addAggregation(ChartString("Other"), expr, 0.05);
+
+    GrxIntervalDomain& interval = vis.addIntervalDomain();
+    interval.setDate(true);
+    GrxRange& range = interval.addRange();
+    range.setMin(u"0");
+    range.setExact(true);
+    GrxCategoricalDomain& domain = vis.addCategoricalDomain();
+    domain.addVariableReference(x);
+    GrxSimpleSort& simple = domain.addSimpleSort(true, 1);
+    simple.addCategoryOrder().setTextContent(u"b;a");
+    simple.addSortMove().setFirst(false);
+    domain.addStatisticSort(false, derived).addSortMove().setCategory(u"a");
+    domain.addCategories().setRemove(true);
+    x.setCategoricalDomain(domain);
+
+    for (auto* source : std::initializer_list<GrxBaseElement*>{
+             &vis.addUserSource(), &vis.addDatabaseSource(), &vis.addDelimitedFileSource(),
+             &vis.addStreamingSource(), &vis.addEmbeddedSource()})
+        source->setId(ChartString(source->getImplementation()->getLocalName()).append(u"1"));
+
+    GrxContainer& box = vis.addContainer();
+    box.addContainer();
+    box.addLabelFrame();
+    GrxLegend& legend = box.addLegend();
+    legend.addLabel();
+    legend.setTickTextStyle(style);
+    legend.setTickFrameStyle(style);
+    box.addControlFrame();
+    box.addKey();
+    box.addLocation(GrxLocation::part_bottom);
+    ext.setLegend(legend, 1);
+
+    GrrUviza& graph = box.addGraph();
+    graph.setCellStyle(style);
+    graph.addLocation(GrxLocation::part_right);
+    GrxCoordinates& coords = graph.addCoordinates();
+    GrxDimension& dim = coords.addDimension();
+    dim.setUpperMargin(u"5%");
+    dim.setDomain(interval);
+    dim.setClusterVariable(x);
+    dim.setNiceLowerMapping(true);
+    dim.addScale(2).setOrigin(u"0");
+    GrxAxis& axis = dim.addAxis();
+    axis.addLabel().addText().setText(ChartString("x axis"));
+    axis.setTransform(0);
+    axis.addAxisTransformParameter().setParameterName(u"base-ratio");
+    GrxMajorTicks& major = axis.addMajorTicks();
+    major.setPosition(1);
+    major.setDeltaUnit(5);
+    major.setMarkStyle(style);
+    major.setTickFrameStyle(style);
+    major.addFormat().setSuffix(u"%");
+    major.addGridline().addConditionalStyle(ChartString("facet1==facet2"), style);
+    GrxMinorTicks& minor = axis.addMinorTicks();
+    minor.setNumber(4);
+    minor.addGridline();
+    coords.addDimensionReference().setDimension(dim);
+    coords.addPolarTransform().setCounterClockwise(true);
+    coords.addTransposeTransform();
+    coords.addReflectionTransform().setAlternating(true);
+    coords.addInsetTransform().setXMin(0.1);
+    coords.addRectangularTransform().setTheta(30);
+    coords.addObliqueTransform().setForeShortening(0.5);
+    coords.addParallelCoordinatesTransform();
+    GrxFacetLayout& facets = graph.addFacetLayout();
+    facets.setMethod(2);
+    GrxFacetLevel& level = facets.addFacetLevel();
+    level.setLevel(1);
+    level.addAxis();
+    facets.addTableLayout();
+    graph.addFaceting().setVariable(x);
+
+    graph.addPointGuide().setX(u"3");
+    graph.addLineGuide().addLabel();
+    graph.addFunctionGuide().setSegments(20);
+    GrxRectangleGuide& rect = graph.addRectangleGuide();
+    rect.setY1(u"1");
+    rect.setZOrder(-2);
+    rect.setCoordinates(coords);
+    rect.addConditionalStyle(ChartString("facet1!=facet2"), style);
+    graph.addPlaneGuide().setNormal(2);
+    graph.addFrameGuide().setComplete(true);
+
+    GrxPoint& point = graph.addPoint();
+    point.setStyle(style);
+    point.setCoordinates(coords);
+    point.addX().setVariable(x);
+    point.addY().setVariable(derived);
+    point.addZ();
+    GrxStyleBy& by = point.addStyleBy();
+    by.setCycle(cycle);
+    by.setVariable(x);
+    by.addScale(3);
+    by.addSummaryStatistic().setMethod(10);
+    by.addColorMapping().setFrom(u"a");
+    by.addDoubleMapping();
+    by.addDashMapping();
+    by.addIntegerMapping();
+    by.addSymbolMapping();
+    point.addDash().setClamp(true);
+    point.addShape();
+    GrxSize& size = point.addSize();
+    size.setLow(u"3%");
+    size.addLengthMapping().setTo(u"5pt");
+    point.addRotation();
+    point.addColor().setAffect(3);
+    point.addOffset().setHigh(u"3%");
+    point.addPattern();
+    point.addTransparency();
+    point.addSplit();
+    GrxColorComponent& component = point.addColorComponent();
+    component.setType(2);
+    component.setAffect(0);
+    point.addVisibility();
+    point.addImage().setMissing(u"gap");
+    GrxLabeling& labeling = point.addLabeling();
+    labeling.setConnectingLines(true);
+    labeling.setTextFrameStyle(style);
+    labeling.addStyleBy();
+    labeling.addColorComponent();
+    labeling.addColor();
+    labeling.addSize();
+    labeling.addSummaryStatistic().setAugment(2);
+    labeling.addFormat();
+    point.addConditionalStyle(ChartString("facet1==facet2"), style);
+    point.addSummaryStatistic().setConvertIntervals(false);
+    GrxBinStatistic& bins = point.addBinStatistic();
+    bins.setBinWidth(u"5");
+    bins.setGridType(1);
+    bins.setMethod(2);
+    GrxSmoothStatistic& smooth = point.addSmoothStatistic();
+    smooth.setKernel(5);
+    smooth.setBounded(false);
+    point.addRegionStatistic().setType(7);
+    point.addDistributionStatistic().setDistribution(12);
+    point.addLinkStatistic().setXReference(4);
+    point.addCollectRowsStatistic();
+    point.addAggregateStatistic();
+    point.addClusteringStatistic();
+    point.addGraphLayoutStatistic();
+    point.addMapStatistic();
+    point.addTagCloudStatistic();
+    point.addTreeLayoutStatistic();
+    point.addFixedWindowDensityStatistic();
+    point.addNearestNeighborDensityStatistic();
+    point.addTukeyStatistic();
+    point.addSelfOrganizingMapStatistic();
+    point.addPatternLinkStatistic();
+    GrxLine& line = graph.addLine();
+    line.setBreakRepresentation(2);
+    line.setShowDiscontinuity(true);
+    graph.addArea();
+    graph.addInterval().setPositionModifier(1);
+    graph.addPath();
+    graph.addEdge();
+    graph.addPolygon();
+    GrxSchema& schema = graph.addSchema();
+    schema.setHingeStyle(style);
+    schema.setMedianStyle(style);
+
+    legend.addLegendTarget(*point.getColors()[0]).setVariable(x);
+    GrxPopup& popup = vis.addPopup(point);
+    popup.setTokenTemplate(u"Y = $[1]$");
+    GrxTokenMapping& token = popup.addTokenMapping();
+    token.setToken(1);
+    token.setVariable(x);
+    token.addSummaryStatistic().setMethod(0);
+}
+
+std::string printed(const DOMDocument* doc, bool whiteSpace, const XMLCh* encoding = nullptr) {
+    ChartPrinter printer;
+    printer.setPrintWhiteSpace(whiteSpace);
+    printer.setEncoding(encoding);
+    std::ostringstream out;
+    printer.Print(doc, out);
+    return out.str();
+}
+
+TEST(RoundTrip, AChartBuiltThroughTheLayerPrintsRevalidatesAndRewraps) {
+    GrxVisualization vis(grxtest::newChartDocument()->getDocumentElement(), true);
+    buildEverything(vis);
+    const std::string text = vis.AsUTF8();
+    std::string errors;
+    auto reparsed = grxtest::parseValidated(text, &errors);
+    ASSERT_TRUE(reparsed) << errors << "\n" << text;
+    GrxVisualization again(reparsed.release()->getDocumentElement(), true);
+    EXPECT_EQ(grxtest::signature(again.getImplementation()), grxtest::signature(vis.getImplementation()));
+    EXPECT_EQ(again.wrapperCount(), vis.wrapperCount());
+    // The references still resolve after the trip.
+    GrrUviza* graph = again.getContainers().at(0)->getGraphs().at(0);
+    GrxPoint* point = graph->getPoints().at(0);
+    EXPECT_EQ(point->getCoordinates(), graph->getCoordinatess().at(0));
+    EXPECT_EQ(point->getStyleBys().at(0)->getCycle(), again.getStyleCycles().at(0));
+    EXPECT_EQ(again.getExtension()->getLegend1(), again.getContainers()[0]->getLegends().at(0));
+    EXPECT_EQ(graph->getSchemas().at(0)->getHingeStyle(), again.getStyles().at(0)->getStyles().at(0));
+
+    // Pretty printing changes only white space.
+    auto pretty = grxtest::parseValidated(printed(vis.getDOMDocument(), true), &errors);
+    ASSERT_TRUE(pretty) << errors;
+    GrxVisualization third(pretty.release()->getDocumentElement(), true);
+    EXPECT_EQ(grxtest::signature(third.getImplementation()), grxtest::signature(vis.getImplementation()));
+}
+
+TEST(RoundTrip, EverySampleChartSurvivesPrintingAndReparsing) {
+    const std::vector<std::string> charts = grxtest::sampleCharts();
+    if (charts.empty())
+        GTEST_SKIP() << "no sample charts in examples/charts";
+    for (const std::string& path : charts) {
+        SCOPED_TRACE(path);
+        std::string errors;
+        auto first = grxtest::parseValidated(grxtest::readFile(path), &errors);
+        ASSERT_TRUE(first) << errors;
+        GrxVisualization vis(first.release()->getDocumentElement(), true);
+        EXPECT_FALSE(vis.getGraphs().empty() && vis.getContainers().empty());
+        auto second = grxtest::parseValidated(vis.AsUTF8(), &errors);
+        ASSERT_TRUE(second) << errors;
+        GrxVisualization again(second.release()->getDocumentElement(), true);
+        EXPECT_EQ(grxtest::signature(again.getImplementation()), grxtest::signature(vis.getImplementation()));
+        EXPECT_EQ(again.wrapperCount(), vis.wrapperCount());
+    }
+}
+
+TEST(ChartPrinter, WritesTheDocumentsOwnEncodingUnlessAskedOtherwise) {
+    const std::string latin1 =
+        "<?xml version=\"1.0\" encoding=\"ISO-8859-1\"?>\n"
+        "<visualization xmlns=\"http://plotaid.org/grxml\" "
+        "xmlns:xsi=\"http://www.w3.org/2001/XMLSchema-instance\" "
+        "xsi:schemaLocation=\"http://plotaid.org/grxml http://plotaid.org/grxml/grxml-2.9.xsd\">"
+        "<labelFrame><label><text>Gr\xF6\xDF"
+        "e</text></label></labelFrame></visualization>";
+    std::string errors;
+    auto parsed = grxtest::parseValidated(latin1, &errors);
+    ASSERT_TRUE(parsed) << errors;
+    GrxVisualization vis(parsed.release()->getDocumentElement(), true);
+    DOMDocument* doc = vis.getDOMDocument();
+    // The declared encoding is honoured...
+    const std::string latin = printed(doc, false);
+    EXPECT_NE(latin.find("encoding=\"ISO-8859-1\""), std::string::npos) << latin;
+    EXPECT_NE(latin.find("Gr\xF6\xDF"
+                         "e"),
+              std::string::npos);
+    // ... but AsUTF8 and an explicit request write what they are asked for.
+    const std::string utf8 = vis.AsUTF8();
+    EXPECT_NE(utf8.find("encoding=\"UTF-8\""), std::string::npos);
+    EXPECT_NE(utf8.find("Gr\xC3\xB6\xC3\x9F"
+                        "e"),
+              std::string::npos);
+    EXPECT_EQ(printed(doc, false, u"UTF-8"), utf8);
+    const std::string utf16 = printed(doc, false, u"UTF-16LE");
+    ASSERT_GE(utf16.size(), 4u);
+    EXPECT_EQ(utf16[0], '<');
+    EXPECT_EQ(utf16[1], '\0');
+    // A document that declares nothing is written as UTF-8.
+    GrxVisualization fresh(grxtest::newChartDocument()->getDocumentElement(), true);
+    EXPECT_NE(printed(fresh.getDOMDocument(), false).find("encoding=\"UTF-8\""), std::string::npos);
+}
+
+TEST(ChartPrinter, PrintsANodeAloneAndPrettyPrintsOnRequest) {
+    GrxVisualization vis(grxtest::newChartDocument()->getDocumentElement(), true);
+    GrxLegend& legend = vis.addLegend();
+    legend.setId(u"legend1");
+    legend.addLabel();
+    std::ostringstream node;
+    ChartPrinter().Print(legend.getImplementation(), node);
+    EXPECT_EQ(node.str().find("<?xml"), std::string::npos);
+    EXPECT_NE(node.str().find("id=\"legend1\""), std::string::npos);
+    EXPECT_EQ(node.str().find('\n'), std::string::npos);
+    EXPECT_NE(printed(vis.getDOMDocument(), true).find("\n  <legend"), std::string::npos);
+    ChartPrinter().Print(static_cast<const DOMNode*>(nullptr), node); // nothing to print, no fault
+}
+
+} // namespace
