@@ -117,6 +117,25 @@ LintResult xmllint(const std::string& schema, const std::string& file) {
     return result;
 }
 
+void useSourceGrammars() {
+    static const bool done = [] {
+        // The grammars both directly inside the folder and in its schemas/ subfolder, so the test
+        // holds whichever of the two the resolver reads.
+        const std::string folder = scratchFolder() + "resources/";
+        fs::create_directories(folder + "schemas");
+        for (const auto& entry : fs::directory_iterator(schemaFolder())) {
+            if (entry.path().extension() != ".xsd")
+                continue;
+            fs::copy_file(entry.path(), folder + entry.path().filename().string(),
+                          fs::copy_options::overwrite_existing);
+            fs::copy_file(entry.path(), folder + "schemas/" + entry.path().filename().string(),
+                          fs::copy_options::overwrite_existing);
+        }
+        return ::setenv("PLOTAID_RESOURCE_DIR", folder.c_str(), 1) == 0;
+    }();
+    (void)done;
+}
+
 std::string dataDocument(const std::string& sources) {
     return "<?xml version=\"1.0\" encoding=\"UTF-8\" standalone=\"no\"?> \n"
            "<gs:graphSources xmlns=\"http://plotaid.org/grxml\" "

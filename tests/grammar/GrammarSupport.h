@@ -29,6 +29,10 @@ struct LintResult {
 LintResult xmllint(const std::string& schema, const std::string& file);
 bool haveXmllint();
 
+// Points the library (and tools started from the test) at a resource folder that holds the
+// source tree's grammars, so the resolver finds them by file name.
+void useSourceGrammars();
+
 // The data document of a small store, byte for byte as the XML data handler writes it.
 std::string dataDocument(const std::string& sources);
 

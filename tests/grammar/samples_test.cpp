@@ -1,0 +1,161 @@
+// The sample charts are the test bed of the whole library: each must be complete (titles,
+// footnotes, legend, axes with ticks and labels, styles by id, data), and every reference in it
+// must lead to an element of the right kind.
+#include "GrammarSupport.h"
+
+#include "foundation/ValidatingParser.h"
+
+#include <xercesc/dom/DOMAttr.hpp>
+#include <xercesc/dom/DOMDocument.hpp>
+#include <xercesc/dom/DOMElement.hpp>
+#include <xercesc/dom/DOMNamedNodeMap.hpp>
+#include <xercesc/dom/DOMNodeList.hpp>
+#include <xercesc/util/TransService.hpp>
+
+#include <gtest/gtest.h>
+
+#include <map>
+#include <set>
+
+using namespace grammar_test;
+using namespace XERCES_CPP_NAMESPACE;
+
+namespace {
+
+std::string utf8(const XMLCh* text) {
+    if (text == nullptr)
+        return std::string();
+    TranscodeToStr converted(text, "UTF-8");
+    return std::string(reinterpret_cast<const char*>(converted.str()), converted.length());
+}
+
+std::u16string wide(const std::string& ascii) {
+    return std::u16string(ascii.begin(), ascii.end());
+}
+
+std::vector<const DOMElement*> all(const DOMDocument& document, const std::string& tag) {
+    const DOMNodeList* list = document.getElementsByTagNameNS(u"http://plotaid.org/grxml", wide(tag).c_str());
+    std::vector<const DOMElement*> out;
+    for (XMLSize_t i = 0; i < list->getLength(); ++i)
+        out.push_back(static_cast<const DOMElement*>(list->item(i)));
+    return out;
+}
+
+std::string attr(const DOMElement* e, const char* name) {
+    return utf8(e->getAttribute(wide(name).c_str()));
+}
+
+std::string tagOf(const DOMElement* e) {
+    return e ? utf8(e->getLocalName()) : std::string("(none)");
+}
+
+std::vector<std::string> split(const std::string& text) {
+    std::vector<std::string> fields(1);
+    for (char c : text) {
+        if (c == ';')
+            fields.emplace_back();
+        else
+            fields.back() += c;
+    }
+    return fields;
+}
+
+// Attributes that hold the id of another element, and the kinds that element may be.
+const std::map<std::string, std::set<std::string>>& references() {
+    static const std::set<std::string> style{"style"};
+    static const std::set<std::string> variable{"sourceVariable", "expressionVariable", "derivedVariable"};
+    static const std::map<std::string, std::set<std::string>> refs = {
+        {"style", style},
+        {"cellStyle", style},
+        {"markStyle", style},
+        {"tickFrameStyle", style},
+        {"tickTextStyle", style},
+        {"textFrameStyle", style},
+        {"hingeStyle", style},
+        {"medianStyle", style},
+        {"fenceStyle", style},
+        {"outlierStyle", style},
+        {"extremeStyle", style},
+        {"cycle", {"styleCycle"}},
+        {"styleCycleRepository", {"styleCycle"}},
+        {"coordinates", {"coordinates"}},
+        {"variable", variable},
+        {"clusterVariable", variable},
+        {"domain", {"categoricalDomain", "intervalDomain"}},
+        {"categoricalDomain", {"categoricalDomain"}},
+        {"source",
+         {"embeddedSource", "userSource", "databaseSource", "delimitedFileSource", "streamingSource"}},
+    };
+    return refs;
+}
+
+class SampleCharts : public ::testing::Test {
+protected:
+    static void SetUpTestSuite() { useSourceGrammars(); }
+    plotaid::detail::ValidatingParser parser;
+};
+
+TEST_F(SampleCharts, AreCompleteAndEveryReferenceResolves) {
+    for (const std::string& chart : sampleCharts()) {
+        SCOPED_TRACE(chart);
+        const DOMDocument* document =
+            parser.parse(readText(chart), chart.c_str(), ChartException("sample chart", "tests/grammar", 0));
+        ASSERT_NE(document, nullptr);
+
+        const std::vector<const DOMElement*> extensions = all(*document, "extension");
+        ASSERT_EQ(extensions.size(), 1u);
+        const DOMElement* title = document->getElementById(wide(attr(extensions[0], "title1")).c_str());
+        EXPECT_EQ(tagOf(title), "labelFrame");
+        const DOMElement* footnote = document->getElementById(wide(attr(extensions[0], "footnote1")).c_str());
+        EXPECT_EQ(tagOf(footnote), "labelFrame");
+        const DOMElement* legend = document->getElementById(wide(attr(extensions[0], "legend1")).c_str());
+        ASSERT_EQ(tagOf(legend), "legend");
+        EXPECT_FALSE(all(*document, "legendTarget").empty());
+
+        const std::vector<const DOMElement*> axes = all(*document, "axis");
+        EXPECT_GE(axes.size(), 1u);
+        for (const DOMElement* axis : axes)
+            EXPECT_TRUE(axis->getElementsByTagNameNS(u"*", u"majorTicks")->getLength() > 0)
+                << attr(axis, "id");
+        EXPECT_GE(all(*document, "dimension").size(), 1u);
+        for (const DOMElement* dimension : all(*document, "dimension")) {
+            const DOMNodeList* labels = dimension->getElementsByTagNameNS(u"*", u"label");
+            ASSERT_GT(labels->getLength(), 0u) << attr(dimension, "id");
+        }
+
+        // every reference leads to an element of a kind that fits
+        std::size_t resolved = 0;
+        for (const DOMElement* element : all(*document, "*")) {
+            if (tagOf(element) == "extension")
+                continue; // its frame slots are checked above; other attributes are open
+            const DOMNamedNodeMap* attributes = element->getAttributes();
+            for (XMLSize_t i = 0; i < attributes->getLength(); ++i) {
+                const auto* a = static_cast<const DOMAttr*>(attributes->item(i));
+                const auto kinds = references().find(utf8(a->getName()));
+                if (kinds == references().end() ||
+                    (tagOf(element) == "style" && utf8(a->getName()) != "style"))
+                    continue;
+                const DOMElement* target = document->getElementById(a->getValue());
+                EXPECT_TRUE(target && kinds->second.count(tagOf(target)))
+                    << tagOf(element) << " " << attr(element, "id") << ": " << utf8(a->getName()) << "=\""
+                    << utf8(a->getValue()) << "\" leads to " << tagOf(target);
+                ++resolved;
+            }
+        }
+        EXPECT_GT(resolved, 20u);
+
+        // the data: every row has one field per variable name
+        const std::vector<const DOMElement*> sources = all(*document, "embeddedSource");
+        ASSERT_FALSE(sources.empty());
+        for (const DOMElement* source : sources) {
+            const std::size_t names =
+                split(utf8(source->getElementsByTagNameNS(u"*", u"names")->item(0)->getTextContent())).size();
+            const DOMNodeList* rows = source->getElementsByTagNameNS(u"*", u"row");
+            ASSERT_GT(rows->getLength(), 0u);
+            for (XMLSize_t r = 0; r < rows->getLength(); ++r)
+                EXPECT_EQ(split(utf8(rows->item(r)->getTextContent())).size(), names) << "row " << r;
+        }
+    }
+}
+
+} // namespace
