@@ -119,8 +119,8 @@ public:
 int main(int argc, char** argv) {
     // The parser reads its schema from a resource folder of the program's own.
     const std::filesystem::path folder = std::filesystem::temp_directory_path() / "plotaid-bench-hostile-xml";
-    std::filesystem::create_directories(folder);
-    std::ofstream(folder / "bench.xsd") << kSchema;
+    std::filesystem::create_directories(folder / "schemas");
+    std::ofstream(folder / "schemas" / "bench.xsd") << kSchema;
     ::setenv("PLOTAID_RESOURCE_DIR", folder.c_str(), 1);
     ::unsetenv("DumpChartXMLPath");
 

@@ -24,10 +24,11 @@ public:
     ChartErrorHandler() = default;
     ~ChartErrorHandler() override;
 
-    // Maps the file name after the last '/' of the system id into the resource folder and returns
-    // a LocalFileInputSource over it (the caller owns it). Anything that does not name an existing
-    // file directly inside the resource folder is refused: logged, and null returned. Install it
-    // only on parsers whose own fall-back resolution is disabled, so a refusal fails the parse.
+    // Maps the file name after the last '/' of the system id into the schema folder of the resource
+    // folder (<resource folder>schemas/) and returns a LocalFileInputSource over it (the caller
+    // owns it). Anything that does not name an existing file directly inside that folder is
+    // refused: logged, and null returned. Install it only on parsers whose own fall-back
+    // resolution is disabled, so a refusal fails the parse.
     XERCES_CPP_NAMESPACE::InputSource* resolveEntity(const XMLCh* const publicId,
                                                      const XMLCh* const systemId) override;
 

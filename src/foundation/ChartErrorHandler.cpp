@@ -8,8 +8,8 @@
 #include <xercesc/sax/SAXParseException.hpp>
 #include <xercesc/util/XMLException.hpp>
 #include <xercesc/util/XMLString.hpp>
-#include <xercesc/util/XMLUniDefs.hpp>
 #include <xercesc/util/XMLUni.hpp>
+#include <xercesc/util/XMLUniDefs.hpp>
 
 #include <chrono>
 #include <climits>
@@ -27,6 +27,8 @@ const char* const kHandlerFile = "backend/chartxml/plotaid/src/charterrorhandler
 constexpr unsigned kSaxLine = 188;
 constexpr unsigned kDomLine = 253;
 constexpr unsigned kResolveLine = 300;
+// Schemas and document type definitions sit in this folder of the resource folder.
+const char* const kSchemaFolder = "schemas/";
 
 struct HostTextRelease {
     void operator()(char* p) const { osport::KovarMBRelease(p); }
@@ -129,17 +131,18 @@ std::string canonical(const std::string& path) {
     return ::realpath(path.c_str(), resolved) ? std::string(resolved) : std::string();
 }
 
-// The canonical path of the named file when it is a regular file directly inside the resource
-// folder (symbolic links followed, and the target still inside); empty otherwise.
+// The canonical path of the named file when it is a regular file directly inside the schema folder
+// of the resource folder (symbolic links followed, and the target still there); empty otherwise.
 std::string resourceFile(const XMLCh* name) {
     const scratchloc::PathFinder* finder =
         scratchloc::PathFactory::getPathInstance(scratchloc::PathFactory::ResourceFolder);
     if (finder == nullptr || !isResourceFileName(name))
         return std::string();
-    const std::string folder = canonical(finder->getPath());
+    const std::string schemas = finder->getPath() + kSchemaFolder;
+    const std::string folder = canonical(schemas);
     if (folder.empty())
         return std::string();
-    const std::string file = canonical(finder->getPath() + toHost(name));
+    const std::string file = canonical(schemas + toHost(name));
     struct stat st {};
     if (file.size() <= folder.size() + 1 || file.compare(0, folder.size(), folder) != 0 ||
         file[folder.size()] != '/' || file.find('/', folder.size() + 1) != std::string::npos ||

@@ -30,7 +30,7 @@ protected:
         return std::unique_ptr<InputSource>(handler.resolveEntity(nullptr, systemId.c_str()));
     }
     std::string resourceFile(const std::string& name) {
-        return std::filesystem::canonical(testData("resources/" + name)).string();
+        return std::filesystem::canonical(testData("resources/schemas/" + name)).string();
     }
 
     plotaid::detail::XercesRuntime runtime;
@@ -76,16 +76,18 @@ TEST_F(Resolver, RefusesWhatIsNotAResourceFileAndSaysSo) {
 
 TEST_F(Resolver, RefusesLinksLeadingOutOfTheResourceFolder) {
     TempDir root;
-    std::filesystem::create_directory(root.file("res"));
-    std::filesystem::create_symlink(testData("marker.txt"), root.file("res/link.xsd"));
-    std::filesystem::create_directory(root.file("res/sub"));
-    writeFile(root.file("res/sub/inner.xsd"), "<x/>");
-    std::filesystem::create_symlink(root.file("res/sub/inner.xsd"), root.file("res/inner.xsd"));
-    writeFile(root.file("res/plain.xsd"), "<x/>");
+    std::filesystem::create_directories(root.file("res/schemas/sub"));
+    std::filesystem::create_symlink(testData("marker.txt"), root.file("res/schemas/link.xsd"));
+    writeFile(root.file("res/schemas/sub/inner.xsd"), "<x/>");
+    std::filesystem::create_symlink(root.file("res/schemas/sub/inner.xsd"),
+                                    root.file("res/schemas/inner.xsd"));
+    writeFile(root.file("res/schemas/plain.xsd"), "<x/>");
+    writeFile(root.file("res/beside.xsd"), "<x/>");
     ScopedEnv folder("PLOTAID_RESOURCE_DIR", root.file("res"));
     EXPECT_EQ(resolve(u"http://x/link.xsd"), nullptr);
     EXPECT_EQ(resolve(u"http://x/inner.xsd"), nullptr);
     EXPECT_EQ(resolve(u"http://x/sub"), nullptr);
+    EXPECT_EQ(resolve(u"http://x/beside.xsd"), nullptr) << "only the schema folder is served";
     EXPECT_NE(resolve(u"http://x/plain.xsd"), nullptr);
 }
 
