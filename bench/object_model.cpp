@@ -1,0 +1,269 @@
+// The chart object model beside its floor, the validated parse of the same document, in one run.
+// A sample chart scaled to at least 10,000 elements is wrapped (every wrapper made and registered,
+// then freed) and parsed with schema validation; wrapping must cost at most half the parse.
+// getElementById must stay a hash look-up: from 1,000 to 100,000 ids its cost per look-up may grow
+// no more than twice as much as that of a std::unordered_map over the same ids in the same run (the
+// floor: random look-ups into 100,000 entries already miss the caches; a scan would grow 100-fold).
+#include <grx/grx.h>
+
+#include <benchmark/benchmark.h>
+
+#include <xercesc/dom/DOMAttr.hpp>
+#include <xercesc/dom/DOMDocument.hpp>
+#include <xercesc/dom/DOMElement.hpp>
+#include <xercesc/dom/DOMImplementation.hpp>
+#include <xercesc/dom/DOMImplementationRegistry.hpp>
+#include <xercesc/dom/DOMNamedNodeMap.hpp>
+#include <xercesc/dom/DOMNodeList.hpp>
+#include <xercesc/framework/LocalFileInputSource.hpp>
+#include <xercesc/framework/MemBufInputSource.hpp>
+#include <xercesc/parsers/XercesDOMParser.hpp>
+#include <xercesc/sax/EntityResolver.hpp>
+#include <xercesc/sax/HandlerBase.hpp>
+#include <xercesc/util/PlatformUtils.hpp>
+
+#include <algorithm>
+#include <cstdio>
+#include <fstream>
+#include <map>
+#include <memory>
+#include <random>
+#include <sstream>
+#include <string>
+#include <unordered_map>
+#include <vector>
+
+using namespace xercesc;
+
+namespace {
+
+constexpr std::size_t kElements = 10000;
+constexpr double kWrapLimit = 0.5;
+constexpr double kLookupLimit = 2.0;
+const std::string kSample = std::string(PLOTAID_EXAMPLES_DIR) + "/charts/scatterplot-matrix.xml";
+const std::string kSchemas = std::string(PLOTAID_EXAMPLES_DIR) + "/../resources/schemas/";
+
+// Schemas by file name from the source tree; nothing from the network.
+class Resolver : public EntityResolver {
+public:
+    InputSource* resolveEntity(const XMLCh* const, const XMLCh* const systemId) override {
+        const std::string id = ChartString(systemId).toUTF8();
+        const std::string path = kSchemas + id.substr(id.rfind('/') + 1);
+        return new LocalFileInputSource(ChartString(path).xc_str());
+    }
+};
+
+class Parser {
+public:
+    Parser() {
+        parser_.setValidationScheme(XercesDOMParser::Val_Always);
+        parser_.setDoNamespaces(true);
+        parser_.setDoSchema(true);
+        parser_.setErrorHandler(&errors_);
+        parser_.setEntityResolver(&resolver_);
+        // The schema is read once; later parses measure the document alone.
+        parser_.cacheGrammarFromParse(true);
+        parser_.useCachedGrammarInParse(true);
+    }
+    DOMDocument* parse(const std::string& text) {
+        MemBufInputSource input(reinterpret_cast<const XMLByte*>(text.data()), text.size(), "bench");
+        parser_.parse(input);
+        return parser_.getErrorCount() == 0 ? parser_.getDocument() : nullptr;
+    }
+    DOMDocument* adopt() { return parser_.adoptDocument(); }
+
+private:
+    XercesDOMParser parser_;
+    HandlerBase errors_; // throws on errors, which ends the benchmark loudly
+    Resolver resolver_;
+};
+
+std::size_t countElements(const DOMDocument* doc) {
+    return doc->getElementsByTagName(u"*")->getLength();
+}
+
+// Gives every id of a copied subtree a suffix, so the copy validates beside the original.
+void renameIds(DOMElement* top, unsigned copy) {
+    std::vector<DOMElement*> pending{top};
+    while (!pending.empty()) {
+        DOMElement* e = pending.back();
+        pending.pop_back();
+        if (DOMAttr* id = e->getAttributeNode(GrxUni::_id)) {
+            ChartString renamed(id->getValue());
+            renamed.append(u"_").appendInteger(copy);
+            id->setValue(renamed.xc_str());
+        }
+        for (DOMElement* c = e->getFirstElementChild(); c; c = c->getNextElementSibling())
+            pending.push_back(c);
+    }
+}
+
+// The sample chart with copies of its graphs appended until it has kElements elements.
+const std::string& scaledChart() {
+    static const std::string text = [] {
+        std::ifstream in(kSample, std::ios::binary);
+        std::ostringstream sample;
+        sample << in.rdbuf();
+        Parser parser;
+        DOMDocument* doc = parser.parse(sample.str());
+        if (!doc)
+            return std::string();
+        DOMElement* root = doc->getDocumentElement();
+        std::vector<DOMElement*> graphs;
+        for (DOMElement* c = root->getFirstElementChild(); c; c = c->getNextElementSibling())
+            if (ChartString(c->getLocalName()).equals(GrxUni::_graph))
+                graphs.push_back(c);
+        for (unsigned copy = 1; countElements(doc) < kElements && !graphs.empty(); ++copy)
+            for (DOMElement* g : graphs) {
+                auto* clone = static_cast<DOMElement*>(g->cloneNode(true));
+                renameIds(clone, copy);
+                root->appendChild(clone);
+            }
+        GrxVisualization vis(root);
+        return vis.AsUTF8();
+    }();
+    return text;
+}
+
+void validatedParse(benchmark::State& state) {
+    Parser parser;
+    const std::string& text = scaledChart();
+    for (auto _ : state)
+        if (!parser.parse(text))
+            state.SkipWithError("the scaled chart does not validate");
+}
+
+void wrap(benchmark::State& state) {
+    Parser parser;
+    DOMDocument* doc = parser.parse(scaledChart());
+    if (!doc) {
+        state.SkipWithError("the scaled chart does not validate");
+        return;
+    }
+    for (auto _ : state) {
+        GrxVisualization vis(doc->getDocumentElement());
+        benchmark::DoNotOptimize(vis.wrapperCount());
+    }
+    state.counters["elements"] = static_cast<double>(countElements(doc));
+}
+
+// A chart of `count` styles with ids, wrapped, so every id is a DOM ID.
+struct IdChart {
+    explicit IdChart(unsigned count) {
+        DOMImplementation* impl = DOMImplementationRegistry::getDOMImplementation(u"LS");
+        DOMDocument* doc = impl->createDocument(u"http://plotaid.org/grxml", GrxUni::_visualization, nullptr);
+        vis = std::make_unique<GrxVisualization>(doc->getDocumentElement(), true);
+        for (unsigned i = 0; i < count; ++i) {
+            ids.push_back(ChartString("style").appendInteger(i));
+            vis->addStyle().setId(ids.back());
+        }
+        std::shuffle(ids.begin(), ids.end(), std::mt19937(2026));
+    }
+    std::unique_ptr<GrxVisualization> vis;
+    std::vector<ChartString> ids;
+};
+
+void getElementById(benchmark::State& state) {
+    IdChart chart(static_cast<unsigned>(state.range(0)));
+    std::size_t i = 0;
+    for (auto _ : state) {
+        const ChartString& id = chart.ids[i++ % chart.ids.size()];
+        if (!chart.vis->getElementById(id))
+            state.SkipWithError("an id was not found");
+    }
+}
+
+// The floor of the look-up: the same ids, in the same order, in a plain hash map.
+void hashMapLookup(benchmark::State& state) {
+    IdChart chart(static_cast<unsigned>(state.range(0)));
+    std::unordered_map<std::u16string, const DOMElement*> map;
+    for (const ChartString& id : chart.ids)
+        map.emplace(id.str(), chart.vis->getElementById(id));
+    std::size_t i = 0;
+    for (auto _ : state) {
+        const ChartString& id = chart.ids[i++ % chart.ids.size()];
+        const auto it = map.find(id.str());
+        if (it == map.end() || !it->second)
+            state.SkipWithError("an id was not found");
+    }
+}
+
+BENCHMARK(validatedParse)->Unit(benchmark::kMillisecond)->Repetitions(5);
+BENCHMARK(wrap)->Unit(benchmark::kMillisecond)->Repetitions(5);
+BENCHMARK(getElementById)->Arg(1000)->Arg(100000)->Repetitions(5);
+BENCHMARK(hashMapLookup)->Arg(1000)->Arg(100000)->Repetitions(5);
+
+class BestTimes : public benchmark::ConsoleReporter {
+public:
+    void ReportRuns(const std::vector<Run>& runs) override {
+        for (const Run& run : runs) {
+            if (run.run_type != Run::RT_Iteration || run.error_occurred || run.iterations == 0)
+                continue;
+            const double perIteration = run.cpu_accumulated_time / static_cast<double>(run.iterations);
+            const std::string name =
+                run.run_name.function_name + (run.run_name.args.empty() ? "" : "/" + run.run_name.args);
+            auto [it, inserted] = best.emplace(name, perIteration);
+            if (!inserted)
+                it->second = std::min(it->second, perIteration);
+        }
+        ConsoleReporter::ReportRuns(runs);
+    }
+    std::map<std::string, double> best;
+};
+
+double best(const BestTimes& r, const char* name) {
+    const auto it = r.best.find(name);
+    return it == r.best.end() ? 0.0 : it->second;
+}
+
+bool within(const BestTimes& r, const char* measured, const char* floor, double limit) {
+    const auto m = r.best.find(measured);
+    const auto f = r.best.find(floor);
+    if (m == r.best.end() || f == r.best.end())
+        return true; // filtered out
+    const double ratio = m->second / f->second;
+    std::printf("%-24s %12.3f us  vs %-24s %12.3f us  ratio %.3f (limit %.2f)%s\n", measured, m->second * 1e6,
+                floor, f->second * 1e6, ratio, limit, ratio > limit ? "  TOO SLOW" : "");
+    return ratio <= limit;
+}
+
+} // namespace
+
+int main(int argc, char** argv) {
+    XMLPlatformUtils::Initialize();
+    bool ok = true;
+    {
+        std::vector<char*> args(argv, argv + argc);
+        char interleave[] = "--benchmark_enable_random_interleaving=true";
+        args.insert(args.begin() + 1, interleave);
+        int count = static_cast<int>(args.size());
+        benchmark::Initialize(&count, args.data());
+        if (benchmark::ReportUnrecognizedArguments(count, args.data()))
+            return 1;
+        if (scaledChart().empty()) {
+            std::fprintf(stderr, "cannot scale %s\n", kSample.c_str());
+            return 1;
+        }
+        std::printf("scaled chart: %zu bytes\n", scaledChart().size());
+        BestTimes reporter;
+        benchmark::RunSpecifiedBenchmarks(&reporter);
+        benchmark::Shutdown();
+        const bool wrapping = within(reporter, "wrap", "validatedParse", kWrapLimit);
+        bool lookup = true;
+        const double dom1k = best(reporter, "getElementById/1000"),
+                     dom100k = best(reporter, "getElementById/100000");
+        const double map1k = best(reporter, "hashMapLookup/1000"),
+                     map100k = best(reporter, "hashMapLookup/100000");
+        if (dom1k > 0 && dom100k > 0 && map1k > 0 && map100k > 0) {
+            const double growth = (dom100k / dom1k) / (map100k / map1k);
+            std::printf("getElementById %8.1f ns at 1,000 ids, %8.1f ns at 100,000 (x%.2f); hash map x%.2f; "
+                        "relative growth %.2f (limit %.2f)%s\n",
+                        dom1k * 1e9, dom100k * 1e9, dom100k / dom1k, map100k / map1k, growth, kLookupLimit,
+                        growth > kLookupLimit ? "  TOO SLOW" : "");
+            lookup = growth <= kLookupLimit;
+        }
+        ok = wrapping && lookup;
+    }
+    XMLPlatformUtils::Terminate();
+    return ok ? 0 : 1;
+}
