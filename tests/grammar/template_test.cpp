@@ -3,7 +3,6 @@
 
 #include <gtest/gtest.h>
 
-#include <regex>
 #include <set>
 
 using namespace grammar_test;
@@ -81,10 +80,13 @@ std::string templateText(const std::string& schema, const std::string& instructi
 
 std::set<std::string> declaredElements(const std::string& schemaFile) {
     const std::string text = readText(schemaFolder() + schemaFile);
-    const std::regex declaration("<xs:element name=\"([A-Za-z0-9_-]+)\"");
+    const std::string opening = "<xs:element name=\"";
     std::set<std::string> names;
-    for (std::sregex_iterator it(text.begin(), text.end(), declaration), end; it != end; ++it)
-        names.insert((*it)[1]);
+    for (std::string::size_type at = text.find(opening); at != std::string::npos;
+         at = text.find(opening, at)) {
+        at += opening.size();
+        names.insert(text.substr(at, text.find('"', at) - at));
+    }
     return names;
 }
 
