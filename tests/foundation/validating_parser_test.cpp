@@ -207,6 +207,16 @@ TEST_F(Parsing, HugeEntityIsRefusedButModestOnesExpand) {
     EXPECT_EQ(std::u16string(doc->getDocumentElement()->getTextContent()).size(), 8 * fits.size());
 }
 
+TEST_F(Parsing, PredefinedAndCharacterReferencesAreNotCountedAsExpansions) {
+    std::string text;
+    for (std::size_t i = 0; i < 2 * ValidatingParser::kEntityExpansionLimit; ++i)
+        text += "&amp;&#65;";
+    const DOMDocument* doc = parser.parse(chart("<label>" + text + "</label>"), "ChartBase", kFailure);
+    ASSERT_NE(doc, nullptr);
+    EXPECT_EQ(std::u16string(doc->getDocumentElement()->getTextContent()).size(),
+              4 * ValidatingParser::kEntityExpansionLimit);
+}
+
 TEST(XercesRuntimeCount, CopiesAreReferencesAndTheLastOneTerminates) {
     const unsigned base = XercesRuntime::references();
     {
