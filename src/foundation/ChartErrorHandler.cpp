@@ -159,16 +159,15 @@ InputSource* ChartErrorHandler::resolveEntity(const XMLCh* const publicId, const
     (void)publicId;
     const int slash = systemId ? XMLString::lastIndexOf(systemId, chForwardSlash) : -1;
     const std::string file = slash > 0 ? resourceFile(systemId + slash + 1) : std::string();
-    if (file.empty()) {
+    const std::unique_ptr<char16_t, WideTextRelease> path(
+        file.empty() ? nullptr : osport::KovarMBTranscodeGeneric(file.c_str()));
+    if (!path) {
         LogMessage("Error -- ChartXML:",
                    "resolveEntity refused '" + printable(toHost(systemId)) +
                        "': not a file of the resource folder",
                    kHandlerFile, kResolveLine, 0);
         return nullptr;
     }
-    const std::unique_ptr<char16_t, WideTextRelease> path(osport::KovarMBTranscodeGeneric(file.c_str()));
-    if (!path)
-        return nullptr;
     try {
         return new LocalFileInputSource(path.get());
     } catch (const XMLException& e) {
