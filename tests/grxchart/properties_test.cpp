@@ -225,3 +225,27 @@ TEST_F(Built, RemovalKeepsEarlierPointersUsable) {
 }
 
 } // namespace
+
+namespace {
+
+TEST_F(Built, OnlyChartElementsAreWrapped) {
+    DOMDocument* doc = vis.getDOMDocument();
+    DOMElement* foreign = doc->createElementNS(u"urn:other", GrxUni::_style);
+    DOMElement* plain = doc->createElement(GrxUni::_legend); // no namespace: taken as the chart's
+    DOMElement* unknown = doc->createElementNS(grxtest::kChartNamespace, u"notAChartElement");
+    for (DOMElement* e : {foreign, plain, unknown})
+        vis.getImplementation()->appendChild(e);
+    EXPECT_EQ(vis.wrap(foreign), nullptr);
+    EXPECT_EQ(foreign->getUserData(GrxUni::_style), nullptr);
+    EXPECT_EQ(vis.wrap(unknown), nullptr);
+    GrxBaseElement* legend = vis.wrap(plain);
+    ASSERT_NE(legend, nullptr);
+    EXPECT_EQ(vis.getLegends().at(0), legend);
+    EXPECT_EQ(vis.wrap(plain), legend); // wrapping again makes nothing new
+    EXPECT_TRUE(vis.getStyles().empty());
+    // Nodes of another document are never wrapped into this one.
+    GrxVisualization other(grxtest::newChartDocument()->getDocumentElement(), true);
+    EXPECT_EQ(vis.wrap(other.addLegend().getImplementation()), nullptr);
+}
+
+} // namespace

@@ -97,7 +97,8 @@ void GrxBaseElement::removeAttribute(const XMLCh* name) {
         return;
     if (a->isId())
         element_->setIdAttributeNode(a, false);
-    element_->removeAttributeNode(a)->release();
+    // Not released: a caller may still hold the node; the document frees it at the end.
+    element_->removeAttributeNode(a);
 }
 
 void GrxBaseElement::importAttributes(const DOMElement* from) {
@@ -139,7 +140,7 @@ void GrxBaseElement::setTextContent(const XMLCh* text) {
     for (DOMNode* n = element_->getFirstChild(); n;) {
         DOMNode* next = n->getNextSibling();
         if (n->getNodeType() == DOMNode::TEXT_NODE || n->getNodeType() == DOMNode::CDATA_SECTION_NODE)
-            element_->removeChild(n)->release();
+            element_->removeChild(n);
         n = next;
     }
     if (text && *text)
@@ -270,7 +271,7 @@ GrxBaseElement& GrxBaseElement::appendChild(const XMLCh* name) {
     GrxBaseElement* w = document_->wrap(child);
     if (!w) {
         // Unknown names are never asked for by the typed classes; keep the DOM as it was.
-        element_->removeChild(child)->release();
+        element_->removeChild(child);
         throw DOMException(DOMException::NOT_SUPPORTED_ERR);
     }
     return *w;

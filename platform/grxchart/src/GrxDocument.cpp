@@ -97,8 +97,10 @@ GrxBaseElement* GrxDocument::wrapOne(DOMElement* element, bool overwrite) {
     if (!overwrite)
         if (GrxBaseElement* existing = wrapperOf(element))
             return existing;
-    if (!sameText(element->getNamespaceURI(), getImplementation()->getNamespaceURI()))
-        return nullptr; // foreign content is not the chart's
+    // Foreign content is not the chart's; a node made without a namespace is taken as ours.
+    const XMLCh* ns = element->getNamespaceURI();
+    if (ns && *ns && !sameText(ns, getImplementation()->getNamespaceURI()))
+        return nullptr;
     const Registry::Maker maker = registry().find(nameOf(element));
     if (!maker)
         return nullptr;

@@ -1,0 +1,2 @@
+// Compiles only if <grx/ChartString.h> brings everything it needs.
+#include <grx/ChartString.h>

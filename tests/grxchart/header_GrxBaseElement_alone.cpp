@@ -1,0 +1,2 @@
+// Compiles only if <grx/GrxBaseElement.h> brings everything it needs.
+#include <grx/GrxBaseElement.h>

@@ -1,0 +1,2 @@
+// Compiles only if <grx/GrxDocument.h> brings everything it needs.
+#include <grx/GrxDocument.h>

@@ -1,0 +1,2 @@
+// Compiles only if <grx/GrxUni.h> brings everything it needs.
+#include <grx/GrxUni.h>

@@ -1,0 +1,2 @@
+// Compiles only if <grx/GrxVisualization.h> brings everything it needs.
+#include <grx/GrxVisualization.h>

@@ -1,0 +1,2 @@
+// Compiles only if <grx/grx.h> brings everything it needs.
+#include <grx/grx.h>
