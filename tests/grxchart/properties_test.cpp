@@ -249,3 +249,67 @@ TEST_F(Built, OnlyChartElementsAreWrapped) {
 }
 
 } // namespace
+
+namespace {
+
+TEST_F(Built, MadeUpIdsAvoidTheOnesInUse) {
+    GrxStyle& taken = vis.addStyle();
+    taken.setId(u"style1");
+    GrxStyle& unnamed = vis.addStyle();
+    GrrUviza& graph = vis.addGraph();
+    graph.setStyle(unnamed);
+    EXPECT_TRUE(ChartString(unnamed.getId()).equals(u"style2"));
+    EXPECT_EQ(graph.getStyle(), &unnamed);
+    // A target that has an id keeps it.
+    graph.setCellStyle(taken);
+    EXPECT_TRUE(ChartString(graph.GetAttribute(u"cellStyle")).equals(u"style1"));
+}
+
+TEST_F(Built, PositionalRemovalAndMixedStatistics) {
+    GrxDimension& dim = vis.addGraph().addCoordinates().addDimension();
+    GrxAxis& first = dim.addAxis();
+    GrxAxis& second = dim.addAxis();
+    dim.removeAxis(5u); // past the end: nothing
+    EXPECT_EQ(dim.getAxiss().size(), 2u);
+    dim.removeAxis(0u);
+    ASSERT_EQ(dim.getAxiss().size(), 1u);
+    EXPECT_EQ(dim.getAxiss()[0], &second);
+    EXPECT_EQ(first.getImplementation()->getParentNode(), nullptr);
+
+    GrxInterval& bar = vis.getGraphs()[0]->addInterval();
+    GrxBinStatistic& bins = bar.addBinStatistic();
+    bar.addX();
+    GrxSummaryStatistic& summary = bar.addSummaryStatistic();
+    const std::vector<CTStatisticType*> all = bar.getStatistics();
+    ASSERT_EQ(all.size(), 2u);
+    EXPECT_EQ(all[0], &bins);
+    EXPECT_EQ(all[1], &summary);
+    // The bin statistic's own words for its method, the summary's plain number.
+    bins.setMethod(1);
+    summary.setMethod(7);
+    EXPECT_TRUE(ChartString(bins.GetAttribute(GrxUni::_method)).equals(u"allDimensions"));
+    EXPECT_TRUE(ChartString(summary.GetAttribute(GrxUni::_method)).equals(u"7"));
+}
+
+TEST(Document, AReferenceDocumentWrapsLikeAVisualization) {
+    DOMDocument* doc = grxtest::newChartDocument();
+    {
+        GrxVisualization build(doc->getDocumentElement());
+        GrxLegend& legend = build.addContainer().addLegend();
+        legend.setId(u"legend_1");
+        legend.addLocation(GrxLocation::part_top).setSpecifiedByUser(true);
+    }
+    // A plain document wrapper over the same DOM, as a frame packer's reference.
+    GrxDocument reference(doc->getDocumentElement(), true);
+    EXPECT_EQ(reference.getVisualization(), nullptr);
+    DOMElement* legend = reference.getImplementation()->getOwnerDocument()->getElementById(u"legend_1");
+    ASSERT_NE(legend, nullptr);
+    auto* location =
+        static_cast<GrxLocation*>(legend->getFirstElementChild()->getUserData(GrxUni::_location));
+    ASSERT_NE(location, nullptr);
+    EXPECT_TRUE(location->getSpecifiedByUser());
+    EXPECT_EQ(location->getDocument(), &reference);
+    EXPECT_NE(legend->getParentNode()->getUserData(GrxUni::_container), nullptr);
+}
+
+} // namespace
