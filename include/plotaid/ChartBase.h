@@ -29,6 +29,9 @@ public:
                             int count, int kind);
     // Whether dumps of the kind are switched on; always false for kinds outside 0-9.
     static bool willPrintString(int kind);
+    // Appends a timing line to <DumpChartTimePath>/chartxmldebug_<Mon><dd>00.txt when that variable
+    // is set. The log is fixed at the first call of the process.
+    static void printDebugInfo(const std::string& text);
 };
 
 #endif
