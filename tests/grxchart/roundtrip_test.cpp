@@ -288,7 +288,7 @@ TEST(RoundTrip, EverySampleChartSurvivesPrintingAndReparsing) {
     }
 }
 
-TEST(ChartPrinter, WritesTheDocumentsOwnEncodingUnlessAskedOtherwise) {
+TEST(ChartPrinter, WritesUtf8UnlessAskedForAnotherEncoding) {
     const std::string latin1 =
         "<?xml version=\"1.0\" encoding=\"ISO-8859-1\"?>\n"
         "<visualization xmlns=\"http://plotaid.org/grxml\" "
@@ -301,26 +301,27 @@ TEST(ChartPrinter, WritesTheDocumentsOwnEncodingUnlessAskedOtherwise) {
     ASSERT_TRUE(parsed) << errors;
     GrxVisualization vis(parsed.release()->getDocumentElement(), true);
     DOMDocument* doc = vis.getDOMDocument();
-    // The declared encoding is honoured...
-    const std::string latin = printed(doc, false);
+    // What the document declares does not matter...
+    const std::string utf8 = printed(doc, false);
+    EXPECT_NE(utf8.find("encoding=\"UTF-8\""), std::string::npos) << utf8;
+    EXPECT_NE(utf8.find("Gr\xC3\xB6\xC3\x9F"
+                        "e"),
+              std::string::npos);
+    EXPECT_EQ(vis.AsUTF8(), utf8);
+    // ... what is asked for does, and an empty request goes back to UTF-8.
+    const std::string latin = printed(doc, false, u"ISO-8859-1");
     EXPECT_NE(latin.find("encoding=\"ISO-8859-1\""), std::string::npos) << latin;
     EXPECT_NE(latin.find("Gr\xF6\xDF"
                          "e"),
               std::string::npos);
-    // ... but AsUTF8 and an explicit request write what they are asked for.
-    const std::string utf8 = vis.AsUTF8();
-    EXPECT_NE(utf8.find("encoding=\"UTF-8\""), std::string::npos);
-    EXPECT_NE(utf8.find("Gr\xC3\xB6\xC3\x9F"
-                        "e"),
-              std::string::npos);
-    EXPECT_EQ(printed(doc, false, u"UTF-8"), utf8);
     const std::string utf16 = printed(doc, false, u"UTF-16LE");
     ASSERT_GE(utf16.size(), 4u);
     EXPECT_EQ(utf16[0], '<');
     EXPECT_EQ(utf16[1], '\0');
-    // A document that declares nothing is written as UTF-8.
-    GrxVisualization fresh(grxtest::newChartDocument()->getDocumentElement(), true);
-    EXPECT_NE(printed(fresh.getDOMDocument(), false).find("encoding=\"UTF-8\""), std::string::npos);
+    EXPECT_EQ(printed(doc, false, u""), utf8);
+    // A character the encoding cannot hold becomes a character reference, not a loss.
+    vis.getLabelFrames()[0]->getLabel()->addText().setText(ChartString("\xE2\x82\xAC"));
+    EXPECT_NE(printed(doc, false, u"ISO-8859-1").find("&#x20AC;"), std::string::npos);
 }
 
 TEST(ChartPrinter, PrintsANodeAloneAndPrettyPrintsOnRequest) {

@@ -46,13 +46,7 @@ void ChartPrinter::Print(const DOMNode* node, std::ostream& out) const {
     if (config->canSetParameter(XMLUni::fgDOMWRTFormatPrettyPrint, whiteSpace_))
         config->setParameter(XMLUni::fgDOMWRTFormatPrettyPrint, whiteSpace_);
 
-    const DOMDocument* doc = node->getNodeType() == DOMNode::DOCUMENT_NODE
-                                 ? static_cast<const DOMDocument*>(node)
-                                 : node->getOwnerDocument();
-    const XMLCh* encoding = encoding_.empty() ? nullptr : encoding_.xc_str();
-    if (!encoding && doc && doc->getXmlEncoding() && *doc->getXmlEncoding())
-        encoding = doc->getXmlEncoding();
-    output->setEncoding(encoding ? encoding : XMLUni::fgUTF8EncodingString);
+    output->setEncoding(encoding_.empty() ? XMLUni::fgUTF8EncodingString : encoding_.xc_str());
 
     StreamTarget target(out);
     output->setByteStream(&target);

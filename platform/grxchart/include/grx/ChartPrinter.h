@@ -9,13 +9,13 @@
 
 #include <ostream>
 
-// Writes DOM documents and nodes as XML text. The encoding is the one set here, else the
-// document's declared encoding, else UTF-8. Faults of the serialiser surface as DOMLSException.
+// Writes DOM documents and nodes as XML text, in UTF-8 unless another encoding is set here
+// (whatever the document declares). Faults of the serialiser surface as DOMLSException.
 class GRX_API ChartPrinter {
 public:
     void setPrintWhiteSpace(bool on) { whiteSpace_ = on; }
     bool getPrintWhiteSpace() const { return whiteSpace_; }
-    // An empty or null name goes back to the document's own choice.
+    // An empty or null name goes back to UTF-8.
     void setEncoding(const XMLCh* encoding) { encoding_ = ChartString(encoding); }
 
     void Print(const xercesc::DOMDocument* document, std::ostream& out) const;
