@@ -38,7 +38,6 @@ namespace {
 constexpr unsigned char kMark = 0xB0;
 constexpr std::uint64_t kHeaderSize = 8;
 constexpr std::uint64_t kEntrySize = 80;
-constexpr std::size_t kSourceNameField = 65;
 constexpr std::size_t kSourceNameMax = 64;
 constexpr std::size_t kVariableField = 288;
 constexpr std::size_t kVariableNameMax = 287;
@@ -212,6 +211,8 @@ public:
     bool read(void* to, std::size_t n) override {
         if (n > size_ - at_)
             return false;
+        if (n == 0)
+            return true; // to may be the null data() of an empty table
         std::memcpy(to, data_ + at_, n);
         at_ += n;
         return true;

@@ -5,6 +5,7 @@
 #include "data/Numbers.h"
 #include "data/Report.h"
 #include "data/StoreAccess.h"
+#include "data/XmlDataForm.h"
 #include "data/XmlText.h"
 
 #include <zpack/zpack.h>
@@ -319,6 +320,79 @@ bool isCompressed(const std::string& text) {
 
 } // namespace
 
+namespace plotaid::detail {
+
+void writeXmlData(VarDataProcessor& store, std::string& doc) {
+    using plotaid::detail::EscapeKind;
+    const auto& sources = Access::sources(store);
+    const auto& stringMaps = Access::stringMaps(store);
+    const auto& strings = Access::strings(store);
+    unsigned long long expected = 4096;
+    for (const auto& [name, bag] : sources)
+        expected += 20ull * bag.variables.size() * store.GetRowCount(name) + 40 * bag.variables.size();
+    doc.reserve(static_cast<std::size_t>(std::min<unsigned long long>(expected, 1ull << 30)));
+
+    doc.append(kHead);
+    for (const auto& [name, bag] : sources) {
+        doc.append("\t<embeddedSource id=\"");
+        plotaid::detail::appendEscaped(doc, name, EscapeKind::SourceName);
+        doc.append("\">\n\t\t<names>");
+        // Per variable: its cells and, walked in step with the rows, its string values.
+        struct Walk {
+            const double* cells;
+            VarDataProcessor::StringMap::const_iterator next, end;
+        };
+        std::vector<Walk> walks;
+        auto maps = stringMaps.find(name);
+        bool first = true;
+        for (const auto& [variable, column] : bag.variables) {
+            if (!first)
+                doc += ';';
+            first = false;
+            plotaid::detail::appendEscaped(doc, variable, EscapeKind::VariableName);
+            Walk w{column.values, {}, {}};
+            if (maps != stringMaps.end()) {
+                auto m = maps->second.find(variable);
+                if (m != maps->second.end()) {
+                    w.next = m->second.begin();
+                    w.end = m->second.end();
+                }
+            }
+            walks.push_back(w);
+        }
+        doc.append("</names>\n\t\t<types>");
+        for (std::size_t i = 0; i < walks.size(); ++i)
+            doc.append(i == 0 ? "string" : ";string");
+        doc.append("</types>\n");
+        if (walks.empty())
+            doc.append("\t\t<row/>\n");
+        const unsigned rows = store.GetRowCount(name);
+        for (unsigned r = 0; r < rows; ++r) {
+            doc.append("\t\t<row>");
+            for (std::size_t i = 0; i < walks.size(); ++i) {
+                if (i > 0)
+                    doc += ';';
+                Walk& w = walks[i];
+                while (w.next != w.end && w.next->first < r)
+                    ++w.next;
+                if (w.next != w.end && w.next->first == r && w.next->second < strings.size())
+                    plotaid::detail::appendEscaped(doc, strings[w.next->second].text, EscapeKind::Value);
+                else
+                    plotaid::detail::appendCell(doc, w.cells[r]);
+            }
+            doc.append("</row>\n");
+        }
+        doc.append("\t</embeddedSource>\n");
+    }
+    doc.append(kTail);
+}
+
+bool readXmlData(VarDataProcessor& store, std::string_view xml) {
+    return fillStore(store, xml, isOldForm(xml));
+}
+
+} // namespace plotaid::detail
+
 XmlDataHandler::XmlDataHandler(const std::string& xml) : xmlText(&xml) {}
 
 XmlDataHandler::XmlDataHandler(const unsigned char* data, unsigned length)
@@ -404,76 +478,13 @@ unsigned char* XmlDataHandler::GetDataStream(unsigned& length) {
 }
 
 bool XmlDataHandler::BuildXmlData(std::string& out, bool compress) {
-    using plotaid::detail::EscapeKind;
     VarDataProcessor store;
     if (!store.ReadStreamData(const_cast<unsigned char*>(stream), streamLength))
         return false;
-
-    const auto& sources = Access::sources(store);
-    const auto& stringMaps = Access::stringMaps(store);
-    const auto& strings = Access::strings(store);
     std::string work;
     std::string& doc = compress ? work : out;
     doc.clear();
-    unsigned long long expected = 4096;
-    for (const auto& [name, bag] : sources)
-        expected += 20ull * bag.variables.size() * store.GetRowCount(name) + 40 * bag.variables.size();
-    doc.reserve(static_cast<std::size_t>(std::min<unsigned long long>(expected, 1ull << 30)));
-
-    doc.append(kHead);
-    for (const auto& [name, bag] : sources) {
-        doc.append("\t<embeddedSource id=\"");
-        plotaid::detail::appendEscaped(doc, name, EscapeKind::SourceName);
-        doc.append("\">\n\t\t<names>");
-        // Per variable: its cells and, walked in step with the rows, its string values.
-        struct Walk {
-            const double* cells;
-            VarDataProcessor::StringMap::const_iterator next, end;
-        };
-        std::vector<Walk> walks;
-        auto maps = stringMaps.find(name);
-        bool first = true;
-        for (const auto& [variable, column] : bag.variables) {
-            if (!first)
-                doc += ';';
-            first = false;
-            plotaid::detail::appendEscaped(doc, variable, EscapeKind::VariableName);
-            Walk w{column.values, {}, {}};
-            if (maps != stringMaps.end()) {
-                auto m = maps->second.find(variable);
-                if (m != maps->second.end()) {
-                    w.next = m->second.begin();
-                    w.end = m->second.end();
-                }
-            }
-            walks.push_back(w);
-        }
-        doc.append("</names>\n\t\t<types>");
-        for (std::size_t i = 0; i < walks.size(); ++i)
-            doc.append(i == 0 ? "string" : ";string");
-        doc.append("</types>\n");
-        if (walks.empty())
-            doc.append("\t\t<row/>\n");
-        const unsigned rows = store.GetRowCount(name);
-        for (unsigned r = 0; r < rows; ++r) {
-            doc.append("\t\t<row>");
-            for (std::size_t i = 0; i < walks.size(); ++i) {
-                if (i > 0)
-                    doc += ';';
-                Walk& w = walks[i];
-                while (w.next != w.end && w.next->first < r)
-                    ++w.next;
-                if (w.next != w.end && w.next->first == r && w.next->second < strings.size())
-                    plotaid::detail::appendEscaped(doc, strings[w.next->second].text, EscapeKind::Value);
-                else
-                    plotaid::detail::appendCell(doc, w.cells[r]);
-            }
-            doc.append("</row>\n");
-        }
-        doc.append("\t</embeddedSource>\n");
-    }
-    doc.append(kTail);
-
+    plotaid::detail::writeXmlData(store, doc);
     if (compress && !zpack::compressString(work, out)) {
         reportDataError("cannot compress the XML data", kXmlDataFile, __LINE__);
         return false;
@@ -488,7 +499,7 @@ unsigned char* XmlDataHandler::BuildDataStream(const std::string& xml, unsigned&
     if (xml.find(kSourceOpen) == npos)
         return nullptr;
     VarDataProcessor store;
-    if (!fillStore(store, xml, false)) {
+    if (!plotaid::detail::readXmlData(store, xml)) {
         reportDataError("the XML data claim more rows than their text holds", kXmlDataFile, __LINE__);
         return nullptr;
     }
