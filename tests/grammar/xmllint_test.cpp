@@ -3,6 +3,8 @@
 
 #include <gtest/gtest.h>
 
+#include <filesystem>
+
 using namespace grammar_test;
 
 namespace {
@@ -113,6 +115,20 @@ TEST_F(Xmllint, DataDocumentsInTheWritersForm) {
     expectInvalid(kData, "data-foreign.xml", dataDocument("<graph/>"), "This element is not expected");
     expectInvalid(kData, "data-row-outside.xml", dataDocument("<row>1</row>"),
                   "This element is not expected");
+}
+
+// The bundled data documents, as the XML data handler writes them.
+TEST_F(Xmllint, BundledDataDocumentsValidate) {
+    std::size_t checked = 0;
+    for (const auto& entry :
+         std::filesystem::directory_iterator(std::string(PLOTAID_EXAMPLES_DIR) + "/data")) {
+        if (entry.path().extension() != ".xml")
+            continue;
+        const LintResult r = xmllint(kData, entry.path().string());
+        EXPECT_EQ(r.exitCode, 0) << entry.path() << "\n" << r.output;
+        ++checked;
+    }
+    EXPECT_GT(checked, 0u);
 }
 
 // A source moves between chart and data document unchanged: every embedded source of every
