@@ -1,6 +1,7 @@
 #include "GrxTestSupport.h"
 
 #include <xercesc/dom/DOMDocument.hpp>
+#include <xercesc/dom/DOMException.hpp>
 
 #include <gtest/gtest.h>
 
@@ -310,6 +311,36 @@ TEST(Document, AReferenceDocumentWrapsLikeAVisualization) {
     EXPECT_TRUE(location->getSpecifiedByUser());
     EXPECT_EQ(location->getDocument(), &reference);
     EXPECT_NE(legend->getParentNode()->getUserData(GrxUni::_container), nullptr);
+}
+
+} // namespace
+
+namespace {
+
+TEST_F(Built, HostileNamesAndDepthAreHandled) {
+    GrxStyle& style = vis.addStyle();
+    EXPECT_FALSE(style.isAttributePresent(nullptr));
+    EXPECT_TRUE(ChartString(style.GetAttribute(nullptr)).empty());
+    style.removeAttribute(nullptr);
+    EXPECT_THROW(style.SetAttribute(static_cast<const XMLCh*>(nullptr), u"x"), DOMException);
+    EXPECT_THROW(style.SetAttribute(u"", u"x"), DOMException);
+    EXPECT_THROW(style.SetAttribute(u"not a name", u"x"), DOMException);
+    EXPECT_FALSE(style.doesIdExist(static_cast<const XMLCh*>(nullptr)));
+
+    // A chain far deeper than any call stack could follow is wrapped and unwrapped without recursion.
+    constexpr int kDepth = 200000;
+    DOMDocument* doc = grxtest::newChartDocument();
+    DOMElement* at = doc->getDocumentElement();
+    for (int i = 0; i < kDepth; ++i)
+        at = static_cast<DOMElement*>(
+            at->appendChild(doc->createElementNS(grxtest::kChartNamespace, GrxUni::_container)));
+    at->setAttribute(GrxUni::_id, u"deepest");
+    GrxVisualization deep(doc->getDocumentElement(), true);
+    EXPECT_EQ(deep.wrapperCount(), static_cast<std::size_t>(kDepth));
+    EXPECT_EQ(deep.getElementById(u"deepest"), at);
+    auto* outer = deep.getContainers().at(0);
+    deep.removeChild(*outer);
+    EXPECT_EQ(deep.getElementById(u"deepest"), nullptr);
 }
 
 } // namespace

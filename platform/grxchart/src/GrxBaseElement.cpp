@@ -76,23 +76,26 @@ GrxStyle* GrxBaseElement::getStyleById(const XMLCh* id) const {
     return wrapperOf<GrxStyle>(getElementById(id));
 }
 
+// A missing name names no attribute: it reads as absent, and writing it is a DOM fault.
 bool GrxBaseElement::isAttributePresent(const XMLCh* name) const {
-    return element_->getAttributeNode(name) != nullptr;
+    return name && *name && element_->getAttributeNode(name) != nullptr;
 }
 
 const XMLCh* GrxBaseElement::GetAttribute(const XMLCh* name) const {
-    const XMLCh* v = element_->getAttribute(name);
+    const XMLCh* v = (name && *name) ? element_->getAttribute(name) : nullptr;
     return v ? v : kEmpty;
 }
 
 void GrxBaseElement::SetAttribute(const XMLCh* name, const XMLCh* value) {
+    if (!name || !*name)
+        throw DOMException(DOMException::INVALID_CHARACTER_ERR);
     element_->setAttribute(name, value ? value : kEmpty);
     if (sameText(name, GrxUni::_id))
         declareId(element_);
 }
 
 void GrxBaseElement::removeAttribute(const XMLCh* name) {
-    DOMAttr* a = element_->getAttributeNode(name);
+    DOMAttr* a = (name && *name) ? element_->getAttributeNode(name) : nullptr;
     if (!a)
         return;
     if (a->isId())
