@@ -7,7 +7,7 @@
 //                      T entries { refCount, len, text }; all integers u32
 //
 // Neither direction builds the raw layout in memory: deflate reads straight from the value arrays
-// and inflate writes straight into them.
+// into the returned array, and inflate writes straight into the value arrays.
 #include <plotaid/VarDataProcessor.h>
 
 #include "data/Report.h"
@@ -75,12 +75,17 @@ uInt zchunk(std::size_t n) {
     return static_cast<uInt>(std::min<std::size_t>(n, std::size_t(1) << 30));
 }
 
-// Deflates into a list of growing chunks; the caller's array is made once, at the end, chunk by
-// chunk, so the compressed bytes never exist twice in full.
+// Deflates straight into the caller's array. The array is sized for the worst case up front, but
+// only the pages that the compressed bytes reach are ever touched, so the memory the stream really
+// takes is its compressed size: no chunk list, no second copy at the end.
 class DeflateSink {
 public:
-    DeflateSink() {
-        ok_ = deflateInit(&zs_, Z_DEFAULT_COMPRESSION) == Z_OK;
+    explicit DeflateSink(std::uint64_t rawLength) {
+        if (deflateInit(&zs_, Z_DEFAULT_COMPRESSION) != Z_OK)
+            return;
+        size_ = deflateBound(&zs_, static_cast<uLong>(rawLength));
+        out_.reset(new (std::nothrow) unsigned char[size_]);
+        ok_ = out_ != nullptr;
         stage_.reserve(kStage);
     }
     ~DeflateSink() { deflateEnd(&zs_); }
@@ -117,73 +122,41 @@ public:
     unsigned char* finish(unsigned& length) {
         flushStage();
         feed(nullptr, 0, Z_FINISH);
-        if (!ok_ || total_ > UINT_MAX)
+        if (!ok_ || !finished_ || produced_ > UINT_MAX)
             return nullptr;
-        auto* out = new (std::nothrow) unsigned char[std::max<std::size_t>(total_, 1)];
-        if (!out)
-            return nullptr;
-        std::size_t at = 0;
-        for (auto& c : chunks_) {
-            std::memcpy(out + at, c.data.get(), c.used);
-            at += c.used;
-            c.data.reset();
-        }
-        length = static_cast<unsigned>(total_);
-        return out;
+        length = static_cast<unsigned>(produced_);
+        return out_.release();
     }
 
 private:
-    struct Chunk {
-        std::unique_ptr<unsigned char[]> data;
-        std::size_t size = 0;
-        std::size_t used = 0;
-    };
-
     void flushStage() {
         if (!stage_.empty())
             feed(stage_.data(), stage_.size(), Z_NO_FLUSH);
         stage_.clear();
     }
 
-    bool room() {
-        if (!chunks_.empty() && chunks_.back().used < chunks_.back().size)
-            return true;
-        const std::size_t size =
-            chunks_.empty() ? kStage : std::min<std::size_t>(chunks_.back().size * 2, std::size_t(8) << 20);
-        Chunk c;
-        c.data.reset(new (std::nothrow) unsigned char[size]);
-        if (!c.data)
-            return ok_ = false;
-        c.size = size;
-        chunks_.push_back(std::move(c));
-        return true;
-    }
-
     void feed(const unsigned char* data, std::size_t n, int flush) {
         std::size_t done = 0;
-        for (;;) {
-            if (!ok_ || !room())
-                return;
-            Chunk& c = chunks_.back();
+        while (ok_) {
             const std::size_t pending = n - done;
             zs_.next_in = const_cast<unsigned char*>(data ? data + done : nullptr);
             zs_.avail_in = zchunk(pending);
-            zs_.next_out = c.data.get() + c.used;
-            zs_.avail_out = zchunk(c.size - c.used);
+            zs_.next_out = out_.get() + produced_;
+            zs_.avail_out = zchunk(size_ - produced_);
             const uInt inBefore = zs_.avail_in;
             const uInt outBefore = zs_.avail_out;
             const bool last = zs_.avail_in == pending;
             const int rc = deflate(&zs_, last ? flush : Z_NO_FLUSH);
             done += inBefore - zs_.avail_in;
-            c.used += outBefore - zs_.avail_out;
-            total_ += outBefore - zs_.avail_out;
-            if (rc == Z_STREAM_END)
-                return;
-            if (rc != Z_OK && rc != Z_BUF_ERROR) {
-                ok_ = false;
+            produced_ += outBefore - zs_.avail_out;
+            if (rc == Z_STREAM_END) {
+                finished_ = true;
                 return;
             }
-            // Everything taken and nothing held back: a plain feed is done.
+            if ((rc != Z_OK && rc != Z_BUF_ERROR) || (outBefore == 0 && produced_ == size_)) {
+                ok_ = false; // the bound was wrong, or zlib failed
+                return;
+            }
             if (flush == Z_NO_FLUSH && done == n && zs_.avail_out > 0)
                 return;
         }
@@ -191,9 +164,11 @@ private:
 
     z_stream zs_{};
     bool ok_ = false;
-    std::vector<Chunk> chunks_;
+    bool finished_ = false;
+    std::unique_ptr<unsigned char[]> out_;
+    std::size_t size_ = 0;
+    std::size_t produced_ = 0;
     std::vector<unsigned char> stage_;
-    std::uint64_t total_ = 0;
 };
 
 // The decompressed stream, read front to back.
@@ -393,9 +368,11 @@ unsigned char* VarDataProcessor::GetDataStream(unsigned& length) {
             return nullptr;
         }
 
-        DeflateSink sink;
-        if (!sink.ok())
+        DeflateSink sink(total);
+        if (!sink.ok()) {
+            reportDataError("cannot allocate the data stream", kVarDataFile, __LINE__);
             return nullptr;
+        }
         unsigned char header[kHeaderSize] = {static_cast<unsigned char>(byteOrderFlag ? 1 : 0), kMark,
                                              static_cast<unsigned char>(count & 0xFF),
                                              static_cast<unsigned char>(count >> 8)};

@@ -99,29 +99,37 @@ std::size_t referenceEnd(std::string_view text, std::size_t amp) {
 // The end of the field that starts at start: the next ';' that does not close a reference (the
 // writer's escapes hold semicolons of their own).
 std::size_t fieldEnd(std::string_view text, std::size_t start) {
-    std::size_t semi = text.find(';', start);
-    for (;;) {
-        if (semi == npos)
-            return text.size();
-        const std::size_t amp = text.substr(0, semi).find('&', start);
-        if (amp == npos)
-            return semi;
-        const std::size_t ref = referenceEnd(text, amp);
-        if (ref != npos && ref - 1 >= semi) {
-            start = ref;
-            semi = text.find(';', start);
-        } else {
-            start = amp + 1;
+    const char* const base = text.data();
+    const std::size_t n = text.size();
+    std::size_t i = start;
+    while (i < n) {
+        const char c = base[i];
+        if (c == ';')
+            return i;
+        if (c == '&') {
+            const std::size_t ref = referenceEnd(text, i);
+            if (ref != npos) {
+                i = ref;
+                continue;
+            }
         }
+        ++i;
     }
+    return n;
+}
+
+bool isBlank(char c) {
+    return c == ' ' || c == '\t' || c == '\n' || c == '\r' || c == '\v' || c == '\f';
 }
 
 std::string_view trimmed(std::string_view field) {
-    const char* blanks = " \t\r\n\v\f";
-    const std::size_t first = field.find_first_not_of(blanks);
-    if (first == npos)
-        return std::string_view();
-    return field.substr(first, field.find_last_not_of(blanks) - first + 1);
+    const char* first = field.data();
+    const char* last = first + field.size();
+    while (first < last && isBlank(*first))
+        ++first;
+    while (last > first && isBlank(last[-1]))
+        --last;
+    return std::string_view(first, static_cast<std::size_t>(last - first));
 }
 
 // Fills one data source of the store from the text, straight into its records.
@@ -154,10 +162,9 @@ public:
         return &bag_->variables.find(variable)->second;
     }
 
-    // A field as the data forms hold it: a number, or else a string value.
+    // A field as the data forms hold it (trimmed, not empty): a number, or else a string value.
     bool set(Column* column, const std::string& variable, unsigned row, std::string_view field) {
-        field = trimmed(field);
-        if (field.empty() || field.front() == '<')
+        if (field.front() == '<')
             return true;
         double value = 0;
         if (plotaid::detail::parseNumber(field.data(), field.data() + field.size(), value)) {
@@ -219,9 +226,9 @@ void processRow(SourceFiller& filler, const std::vector<std::string>& names, std
     std::size_t start = 0;
     for (std::size_t i = 0; i < names.size() && start <= text.size(); ++i) {
         const std::size_t end = fieldEnd(text, start);
-        const std::string_view field = text.substr(start, end - start);
+        const std::string_view field = trimmed(text.substr(start, end - start));
         start = end + 1;
-        if (trimmed(field).empty())
+        if (field.empty())
             continue;
         if (!columns[i] && !(columns[i] = filler.column(names[i])))
             return;
@@ -241,9 +248,9 @@ void processOldRow(SourceFiller& filler, std::unordered_map<std::string, Column*
         if (close == npos)
             return;
         const std::size_t valueEnd = std::min(text.find('<', close + 1), text.size());
-        const std::string_view value = text.substr(close + 1, valueEnd - close - 1);
+        const std::string_view value = trimmed(text.substr(close + 1, valueEnd - close - 1));
         at = text.find(kOldValueOpen, valueEnd);
-        if (trimmed(value).empty())
+        if (value.empty())
             continue;
         const std::string name = plotaid::detail::unescape(text.substr(nameStart, quote - nameStart));
         Column*& column = columns[name];
@@ -298,17 +305,19 @@ bool fillStore(VarDataProcessor& store, std::string_view text, bool oldForm) {
         std::size_t row = findBefore(text, kRowOpen, at, end);
         for (unsigned r = 0; r < rows && row != npos; ++r) {
             const std::size_t from = row + kRowOpen.size();
+            std::size_t to = 0;
             if (oldForm) {
-                const std::size_t to = std::min(text.find(kRowClose, from), end);
+                to = std::min(text.find(kRowClose, from), end);
                 processOldRow(filler, oldColumns, r, text.substr(from, to - from));
             } else {
                 // Fields hold no '<' (the writer escapes it), so the first one ends the row.
-                const std::size_t to = std::min(text.find('<', from), end);
+                to = std::min(text.find('<', from), end);
                 processRow(filler, names, columns, r, text.substr(from, to - from));
             }
             if (filler.failed())
                 return false;
-            row = findBefore(text, kRowOpen, from, end);
+            // An unclosed row of the older form may hold the next row's opening.
+            row = findBefore(text, kRowOpen, oldForm ? from : to, end);
         }
     }
     return true;
