@@ -66,22 +66,47 @@ public:
     // Together with the expansion limit this bounds the text that entities can produce, which
     // the expansion limit alone does not (a few references to one huge entity).
     void entityDecl(const DTDEntityDecl& decl, const bool isPEDecl, const bool isIgnored) override {
-        if (!decl.isExternal() && decl.getValueLen() > ValidatingParser::kEntityValueLimit) {
-            const std::string message = "entity '" + toHost(decl.getName()) + "' has more than " +
-                                        std::to_string(ValidatingParser::kEntityValueLimit) +
-                                        " characters; this is the limit imposed by the application";
-            const std::unique_ptr<char16_t, WideTextRelease> text(
-                osport::KovarMBTranscodeGeneric(message.c_str()));
-            const Locator* where = getScanner()->getLocator();
-            XercesDOMParser::error(0, XMLUni::fgXMLErrDomain, XMLErrorReporter::ErrType_Fatal, text.get(),
-                                   where ? where->getSystemId() : nullptr,
-                                   where ? where->getPublicId() : nullptr, where ? where->getLineNumber() : 0,
-                                   where ? where->getColumnNumber() : 0);
-            // A handler that did not stop the parse is overruled.
-            throw SAXParseException(text.get(), nullptr, nullptr, 0, 0);
-        }
+        if (!decl.isExternal() && decl.getValueLen() > ValidatingParser::kEntityValueLimit)
+            refuse("entity '" + toHost(decl.getName()) + "' has more than " +
+                   std::to_string(ValidatingParser::kEntityValueLimit) +
+                   " characters; this is the limit imposed by the application");
         XercesDOMParser::entityDecl(decl, isPEDecl, isIgnored);
     }
+
+    // The scanner's prefix look-up is linear in the depth, so unbounded nesting costs quadratic time.
+    void startDocument() override {
+        depth_ = 0;
+        XercesDOMParser::startDocument();
+    }
+    void startElement(const XMLElementDecl& decl, const unsigned int urlId, const XMLCh* const prefix,
+                      const RefVectorOf<XMLAttr>& attributes, const XMLSize_t count, const bool isEmpty,
+                      const bool isRoot) override {
+        if (!isEmpty && ++depth_ > ValidatingParser::kNestingLimit)
+            refuse("elements are nested more than " + std::to_string(ValidatingParser::kNestingLimit) +
+                   " deep; this is the limit imposed by the application");
+        XercesDOMParser::startElement(decl, urlId, prefix, attributes, count, isEmpty, isRoot);
+    }
+    void endElement(const XMLElementDecl& decl, const unsigned int urlId, const bool isRoot,
+                    const XMLCh* const prefix) override {
+        if (depth_ > 0)
+            --depth_;
+        XercesDOMParser::endElement(decl, urlId, isRoot, prefix);
+    }
+
+private:
+    // Reports a limit as a fatal error at the current position and stops the parse even when the
+    // handler would let it go on.
+    [[noreturn]] void refuse(const std::string& message) {
+        const std::unique_ptr<char16_t, WideTextRelease> text(
+            osport::KovarMBTranscodeGeneric(message.c_str()));
+        const Locator* where = getScanner()->getLocator();
+        XercesDOMParser::error(0, XMLUni::fgXMLErrDomain, XMLErrorReporter::ErrType_Fatal, text.get(),
+                               where ? where->getSystemId() : nullptr, where ? where->getPublicId() : nullptr,
+                               where ? where->getLineNumber() : 0, where ? where->getColumnNumber() : 0);
+        throw SAXParseException(text.get(), nullptr, nullptr, 0, 0);
+    }
+
+    std::size_t depth_ = 0;
 };
 
 // Remembers refusals, so a command-line validator can say which entity was refused.

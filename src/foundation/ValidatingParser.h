@@ -39,6 +39,8 @@ public:
     // ... and no internal entity may hold a longer replacement text, which bounds what expansion
     // can produce at a few tens of megabytes.
     static constexpr std::size_t kEntityValueLimit = 2048;
+    // Deeper element nesting is refused (charts nest a few dozen levels, tree models a few hundred).
+    static constexpr std::size_t kNestingLimit = 1024;
 
     ValidatingParser();
     ~ValidatingParser();

@@ -191,6 +191,29 @@ TEST_F(Parsing, BillionLaughsIsRefused) {
         << dumps.log();
 }
 
+std::string nestedGroups(std::size_t depth) {
+    std::string body;
+    for (std::size_t i = 0; i < depth; ++i)
+        body += "<group>";
+    for (std::size_t i = 0; i < depth; ++i)
+        body += "</group>";
+    return chart(body);
+}
+
+TEST_F(Parsing, NestingIsBoundedWhileDeepTreesStillParse) {
+    // The chart element itself is one level.
+    EXPECT_NE(parser.parse(nestedGroups(ValidatingParser::kNestingLimit - 1), "ChartBase", kFailure),
+              nullptr);
+    EXPECT_EQ(parser.parse(nestedGroups(ValidatingParser::kNestingLimit), "ChartBase", kFailure), nullptr);
+    ASSERT_FALSE(parser.lastErrors().empty());
+    EXPECT_NE(parser.lastErrors().front().find("nested more than 1024 deep"), std::string::npos)
+        << parser.lastErrors().front();
+    // A hostile depth is refused as soon as the limit is passed, not after the whole text.
+    EXPECT_EQ(parser.parse(nestedGroups(200000), "ChartBase", kFailure), nullptr);
+    EXPECT_NE(dumps.log().find("Fatal Error -- SAX Parser: elements are nested more than"),
+              std::string::npos);
+}
+
 TEST_F(Parsing, HugeEntityIsRefusedButModestOnesExpand) {
     const std::string big(ValidatingParser::kEntityValueLimit + 1, 'x');
     const std::string refs = "&big;&big;&big;&big;&big;&big;&big;&big;";
