@@ -5,6 +5,9 @@
 
 #include <string>
 
+class GrxFormat;
+class Kovar_Format;
+
 // Base of the library's document builders.
 class PLOTAID_API ChartBase {
 public:
@@ -32,6 +35,15 @@ public:
     // Appends a timing line to <DumpChartTimePath>/chartxmldebug_<Mon><dd>00.txt when that variable
     // is set. The log is fixed at the first call of the process.
     static void printDebugInfo(const std::string& text);
+
+    // Host print formats to object-model formats, so chart labels print as the host's output does.
+    // addFormat dispatches by type and leaves types it does not convert alone (true); the others
+    // give false for a type outside their own.
+    static bool addFormat(GrxFormat& format, const Kovar_Format& hostFormat);
+    static bool FormatNumber(GrxFormat& format, const Kovar_Format& hostFormat);
+    static bool FormatDate(GrxFormat& format, const Kovar_Format& hostFormat);
+    static bool FormatElapsedTime(GrxFormat& format, const Kovar_Format& hostFormat);
+    static bool FormatCustomCurrency(GrxFormat& format, const Kovar_Format& hostFormat);
 };
 
 #endif
