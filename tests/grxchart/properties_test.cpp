@@ -290,6 +290,11 @@ TEST_F(Built, PositionalRemovalAndMixedStatistics) {
     summary.setMethod(7);
     EXPECT_TRUE(ChartString(bins.GetAttribute(GrxUni::_method)).equals(u"allDimensions"));
     EXPECT_TRUE(ChartString(summary.GetAttribute(GrxUni::_method)).equals(u"7"));
+    // Through the common base the words still read as their numbers.
+    EXPECT_EQ(all[0]->getMethod(), 1);
+    all[0]->setMethod(2);
+    EXPECT_TRUE(ChartString(bins.GetAttribute(GrxUni::_method)).equals(u"notResponse"));
+    EXPECT_EQ(all[1]->getMethod(), 7);
 }
 
 TEST(Document, AReferenceDocumentWrapsLikeAVisualization) {

@@ -11,6 +11,7 @@
 #include <grx/GrxMembers.h>
 #include <grx/GrxUni.h>
 
+#include <iterator>
 #include <string>
 #include <vector>
 
@@ -417,7 +418,23 @@ class GRX_API GrxStyleCycle : public GrxBaseElement {
 
 class GRX_API CTStatisticType : public GrxBaseElement {
     GRX_KIND(GrxBaseElement)
-    GRX_INT(Method, GrxUni::_method, 0)
+    // A number; kinds with words for their methods say so through methodWords().
+    int getMethod() const {
+        const MethodWords w = methodWords();
+        return getEnum(GrxUni::_method, w.words, w.count, 0);
+    }
+    void setMethod(int method) {
+        const MethodWords w = methodWords();
+        setEnum(GrxUni::_method, w.words, w.count, method);
+    }
+    GRX_PRESENCE(Method, GrxUni::_method)
+
+protected:
+    struct MethodWords {
+        const grx::EnumWord* words;
+        std::size_t count;
+    };
+    virtual MethodWords methodWords() const { return {nullptr, 0}; }
 };
 
 class GRX_API GrxSummaryStatistic : public CTStatisticType {
@@ -439,8 +456,9 @@ class GRX_API GrxBinStatistic : public CTStatisticType {
     GRX_TEXT(BinCount, _binCount)
     GRX_ENUM(GridType, GrxUni::_gridType, grx::kGridType, 0)
     GRX_ENUM(Location, GrxUni::_location, grx::kBinLocation, 0)
-    // Hides the plain integer method of the base: bins have their own words.
-    GRX_ENUM(Method, GrxUni::_method, grx::kBinMethod, 0)
+
+protected:
+    MethodWords methodWords() const override { return {grx::kBinMethod, std::size(grx::kBinMethod)}; }
 };
 
 class GRX_API GrxSmoothStatistic : public CTStatisticType {
