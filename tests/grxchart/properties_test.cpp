@@ -31,6 +31,14 @@ TEST_F(Built, IdsSetThroughTheLayerAnswerLookups) {
     EXPECT_EQ(doc->getElementById(u"s1"), nullptr);
     EXPECT_EQ(vis.getStyleById(u"s2"), &style);
 
+    // With a duplicate, the element given the id last answers.
+    GrxStyle& twin = vis.addStyle();
+    twin.setId(u"s2");
+    EXPECT_EQ(vis.getStyleById(u"s2"), &twin);
+    vis.removeChild(twin);
+    EXPECT_EQ(vis.getStyleById(u"s2"), nullptr);
+    style.setId(u"s2"); // declared again
+
     // Removing the attribute or the node withdraws the id.
     graph.removeAttribute(GrxUni::_id);
     EXPECT_EQ(doc->getElementById(u"g1"), nullptr);

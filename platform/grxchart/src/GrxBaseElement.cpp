@@ -22,11 +22,15 @@ namespace {
 constexpr XMLCh kEmpty[] = u"";
 constexpr XMLCh kXmlnsUri[] = u"http://www.w3.org/2000/xmlns/";
 
-// Declares the element's "id" a DOM ID, so the document's id map answers for it.
+// Declares the element's "id" a DOM ID, so the document's id map answers for it. With a duplicate
+// id the element declared last answers (the id map alone would keep answering with the first).
 void declareId(DOMElement* e) {
     DOMAttr* a = e->getAttributeNode(GrxUni::_id);
-    if (a && !a->isId())
-        e->setIdAttributeNode(a, true);
+    if (!a || a->isId())
+        return;
+    if (DOMElement* earlier = e->getOwnerDocument()->getElementById(a->getValue()); earlier && earlier != e)
+        earlier->setIdAttributeNode(earlier->getAttributeNode(GrxUni::_id), false);
+    e->setIdAttributeNode(a, true);
 }
 
 // A detached subtree must stop answering getElementById.
