@@ -221,18 +221,36 @@ private:
     std::unordered_map<std::string, unsigned> index_;
 };
 
-void processRow(SourceFiller& filler, const std::vector<std::string>& names, std::vector<Column*>& columns,
-                unsigned row, std::string_view text) {
+// Reads the fields of one row, up to the '<' that ends it (fields hold none: the writer escapes
+// it); returns where the row ended.
+std::size_t processRow(SourceFiller& filler, const std::vector<std::string>& names,
+                       std::vector<Column*>& columns, unsigned row, std::string_view text) {
+    const char* const base = text.data();
+    const std::size_t n = text.size();
     std::size_t start = 0;
-    for (std::size_t i = 0; i < names.size() && start <= text.size(); ++i) {
-        const std::size_t end = fieldEnd(text, start);
-        const std::string_view field = trimmed(text.substr(start, end - start));
+    for (std::size_t i = 0;; ++i) {
+        std::size_t end = start;
+        while (end < n) {
+            const char c = base[end];
+            if (c == ';' || c == '<')
+                break;
+            if (c == '&') {
+                const std::size_t ref = referenceEnd(text, end);
+                if (ref != npos) {
+                    end = ref;
+                    continue;
+                }
+            }
+            ++end;
+        }
+        if (i < names.size() && !filler.failed()) {
+            const std::string_view field = trimmed(text.substr(start, end - start));
+            if (!field.empty() && (columns[i] || (columns[i] = filler.column(names[i]))))
+                filler.set(columns[i], names[i], row, field);
+        }
+        if (end >= n || base[end] == '<')
+            return end;
         start = end + 1;
-        if (field.empty())
-            continue;
-        if (!columns[i] && !(columns[i] = filler.column(names[i])))
-            return;
-        filler.set(columns[i], names[i], row, field);
     }
 }
 
@@ -310,9 +328,7 @@ bool fillStore(VarDataProcessor& store, std::string_view text, bool oldForm) {
                 to = std::min(text.find(kRowClose, from), end);
                 processOldRow(filler, oldColumns, r, text.substr(from, to - from));
             } else {
-                // Fields hold no '<' (the writer escapes it), so the first one ends the row.
-                to = std::min(text.find('<', from), end);
-                processRow(filler, names, columns, r, text.substr(from, to - from));
+                to = from + processRow(filler, names, columns, r, text.substr(from, end - from));
             }
             if (filler.failed())
                 return false;
