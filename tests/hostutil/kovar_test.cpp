@@ -110,6 +110,17 @@ TEST(KovarToString, NumbersAreRightAlignedInTheirWidth) {
     EXPECT_EQ(print(5.0, 5, 0, 0), "");
 }
 
+TEST(KovarToString, HalvesRoundAwayFromZero) {
+    EXPECT_EQ(print(42.25, 5, 5, 1), " 42.3");
+    EXPECT_EQ(print(2.675, 5, 5, 2), " 2.68");
+    EXPECT_EQ(print(0.5, 5, 3, 0), "  1");
+    EXPECT_EQ(print(-0.5, 5, 3, 0), " -1");
+    EXPECT_EQ(print(9.995, 5, 6, 2), " 10.00");
+    EXPECT_EQ(print(999.5, 3, 5, 0), "1,000");
+    EXPECT_EQ(print(0.04, 5, 4, 1), " 0.0");
+    EXPECT_EQ(print(3.0, 5, 6, 3), " 3.000");
+}
+
 TEST(KovarToString, DatesAndTimesCountSecondsFromTheCalendarStart) {
     EXPECT_EQ(print(0.0, 39, 10, 0), "1582/10/14");
     EXPECT_EQ(print(86400.0, 20, 11, 0), "15-OCT-1582");

@@ -20,13 +20,43 @@ std::array<customCurrency, currencyFormat::kCount>& currencies() {
     return all;
 }
 
-// Digits of |value| with the given decimals; to_chars keeps the process locale out of it.
+// Digits of |value| with the given decimals, halves rounded away from zero as the host prints
+// them (42.25 to one decimal is 42.3). Rounding works on the shortest exact decimal text, so a
+// binary tie is not taken to the even neighbour; to_chars keeps the process locale out of it.
 std::string plainDigits(double value, int decimals, bool scientific) {
     char buf[512];
-    const auto r =
-        std::to_chars(buf, buf + sizeof buf, std::fabs(value),
-                      scientific ? std::chars_format::scientific : std::chars_format::fixed, decimals);
-    return r.ec == std::errc() ? std::string(buf, r.ptr) : std::string();
+    const double magnitude = std::fabs(value);
+    if (scientific) {
+        const auto r =
+            std::to_chars(buf, buf + sizeof buf, magnitude, std::chars_format::scientific, decimals);
+        return r.ec == std::errc() ? std::string(buf, r.ptr) : std::string();
+    }
+    const auto r = std::to_chars(buf, buf + sizeof buf, magnitude, std::chars_format::fixed);
+    if (r.ec != std::errc())
+        return std::string();
+    std::string digits(buf, r.ptr);
+    std::size_t point = digits.find('.');
+    if (point == std::string::npos) {
+        point = digits.size();
+        digits += '.';
+    }
+    std::string fraction = digits.substr(point + 1);
+    std::string whole = digits.substr(0, point);
+    const std::size_t keep = static_cast<std::size_t>(decimals);
+    const bool roundUp = fraction.size() > keep && fraction[keep] >= '5';
+    fraction.resize(keep, '0');
+    std::string kept = whole + fraction;
+    if (roundUp) {
+        std::size_t i = kept.size();
+        while (i > 0 && kept[i - 1] == '9')
+            kept[--i] = '0';
+        if (i == 0)
+            kept.insert(0, 1, '1');
+        else
+            ++kept[i - 1];
+    }
+    const std::size_t wholeDigits = kept.size() - keep;
+    return keep == 0 ? kept : kept.substr(0, wholeDigits) + "." + kept.substr(wholeDigits);
 }
 
 std::string grouped(std::string digits, char point, char group) {
