@@ -300,3 +300,22 @@ TEST(DataStreamHostile, TrailingBytesFail) {
     packed[packed.size() - 1] ^= 1; // checksum
     EXPECT_FALSE(readInto(back, packed));
 }
+
+TEST(DataStreamLimits, MoreSourcesThanTheHeaderCountsAreRefused) {
+    VarDataProcessor store;
+    for (unsigned s = 0; s < 65536; ++s)
+        store.AddDataSource("s" + std::to_string(s), 0);
+    unsigned length = 99;
+    std::unique_ptr<unsigned char[]> s(store.GetDataStream(length));
+    EXPECT_EQ(s, nullptr) << "S is 16 bits: 65536 would be written as 0";
+    EXPECT_EQ(length, 0u);
+    store.Reset();
+    for (unsigned k = 0; k < 65535; k += 1000)
+        store.AddDataSource("s" + std::to_string(k), 0);
+    s.reset(store.GetDataStream(length));
+    ASSERT_NE(s, nullptr);
+    VarDataProcessor back;
+    ASSERT_TRUE(back.ReadStreamData(s.get(), length));
+    std::vector<std::string> names;
+    EXPECT_EQ(back.GetSourceNames(names), 66);
+}

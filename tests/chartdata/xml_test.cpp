@@ -327,3 +327,43 @@ TEST(XmlDataWriter, OutputValidatesWithXmllint) {
     ::rmdir(dir);
     EXPECT_TRUE(WIFEXITED(status) && WEXITSTATUS(status) == 0) << output;
 }
+
+namespace {
+// The row-level steps, as a subclass reaches them.
+struct StepHandler : XmlDataHandler {
+    StepHandler() : XmlDataHandler(nullptr, 0) {}
+    using XmlDataHandler::Count_1_4_Rows;
+    using XmlDataHandler::CountRows;
+    using XmlDataHandler::ExtractName;
+    using XmlDataHandler::Process_1_4_Row;
+    using XmlDataHandler::ProcessRow;
+};
+} // namespace
+
+TEST(XmlDataSteps, RowsNamesAndSingleRows) {
+    StepHandler h;
+    EXPECT_EQ(h.CountRows("<row>1</row><row/><row>2</row></embeddedSource><row>3</row>"), 2u);
+    EXPECT_EQ(h.Count_1_4_Rows("<row></row></source><row></row>"), 1u);
+    EXPECT_EQ(h.CountRows(nullptr), 0u);
+    std::string name = "old";
+    EXPECT_TRUE(h.ExtractName("a&amp;b\" rest", name));
+    EXPECT_EQ(name, "a&b");
+    EXPECT_FALSE(h.ExtractName("no quote", name));
+    EXPECT_EQ(name, "");
+
+    VarDataProcessor store;
+    store.AddDataSource("s", 0);
+    h.ProcessRow(store, "s", {"a", "b", "c"}, 4, "<row>1;;3;9</row><row>5</row>");
+    EXPECT_EQ(store.GetRowCount("s"), 5u);
+    EXPECT_EQ(store.GetDataPointer("s", "a")[4], 1);
+    EXPECT_EQ(store.GetDataPointer("s", "c")[4], 3);
+    std::vector<std::string> vars;
+    EXPECT_EQ(store.GetVariableNames("s", vars), 2) << "an empty field creates no variable";
+    h.Process_1_4_Row(store, "s", 1200,
+                      "<dataValue name=\"b\">2.5</dataValue></row><dataValue name=\"x\">1</dataValue>");
+    EXPECT_EQ(store.GetDataPointer("s", "b")[1200], 2.5);
+    EXPECT_GE(store.GetCapacity("s"), 1201u);
+    EXPECT_EQ(store.GetVariableNames("s", vars), 3);
+    h.ProcessRow(store, "absent", {"a"}, 0, "<row>1</row>");
+    EXPECT_EQ(store.GetCapacity("absent"), 0u);
+}
