@@ -2,10 +2,12 @@
 #define PLOTAID_PLOTAID_H
 
 // Everything a host needs: one header per exported class.
+#include <plotaid/BaseTemplate.h>
 #include <plotaid/ChartBase.h>
 #include <plotaid/ChartErrorHandler.h>
 #include <plotaid/ChartException.h>
 #include <plotaid/ChartKey.h>
+#include <plotaid/ChartTemplate.h>
 #include <plotaid/Kovar_Format.h>
 #include <plotaid/splitInfo.h>
 #include <plotaid/TimeConverter.h>

@@ -1,5 +1,7 @@
 #include <plotaid/ChartErrorHandler.h>
 
+#include "foundation/RecordSink.h"
+
 #include <osport/osport.h>
 #include <scratchloc/PathFactory.h>
 
@@ -245,6 +247,7 @@ void ChartErrorHandler::fatalError(const ChartException& e) {
 
 void ChartErrorHandler::LogMessage(const char* prefix, const std::string& message, const std::string& file,
                                    unsigned long long line, unsigned long long column) noexcept {
+    plotaid::detail::RecordCollector::deliver(prefix, message);
     const char* folder = std::getenv("DumpChartXMLPath");
     if (folder == nullptr)
         return;

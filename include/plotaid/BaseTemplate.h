@@ -1,0 +1,121 @@
+#ifndef PLOTAID_BASETEMPLATE_H
+#define PLOTAID_BASETEMPLATE_H
+
+#include <plotaid/Export.h>
+
+#include <grx/ChartString.h>
+
+#include <xercesc/util/XercesDefs.hpp>
+
+#include <cstdint>
+#include <string>
+#include <vector>
+
+XERCES_CPP_NAMESPACE_BEGIN
+class DOMElement;
+XERCES_CPP_NAMESPACE_END
+
+class CTAesthetic;
+class CTElementType;
+class CTVariableType;
+class GrrUviza;
+class GrxAxis;
+class GrxBaseElement;
+class GrxDimension;
+class GrxInterval;
+class GrxLegend;
+class GrxStyle;
+class GrxVisualization;
+
+// Base of every template action: what an action works on (the target visualization, the chart's
+// own definition as the source, the instruction element) and the look-ups and small edits that
+// many actions share. An action is made for one instruction, applied once and destroyed.
+class PLOTAID_API BaseTemplate {
+public:
+    BaseTemplate(const GrxVisualization* source, GrxVisualization& target,
+                 const XERCES_CPP_NAMESPACE::DOMElement* instruction);
+    BaseTemplate(const GrxVisualization* source, GrxVisualization& target);
+    BaseTemplate(const BaseTemplate& other) = default;
+    BaseTemplate& operator=(const BaseTemplate&) = delete;
+
+    // Carries out the instruction; false when it changed nothing it was asked to.
+    virtual bool apply() = 0;
+    virtual ~BaseTemplate();
+
+    // `prefix` followed by the first number from 1 up that is no id of the target.
+    ChartString CreateUniqueId(const ChartString& prefix) const;
+    ChartString CreateUniqueId(const std::string& prefix) const;
+    // A style with `id` (a fresh "style<n>" when empty) inside the one container style that holds
+    // every style a template adds; an existing style of that id is returned as it is. The style
+    // is not attached to `element`: callers refer to it by its id.
+    GrxStyle& addStyle(GrxBaseElement& element, const XMLCh* id);
+
+    // The graphs the instruction's "graph" attribute selects (its number from 1, or all for 0 or
+    // none) are appended; returns how many graphs the target holds.
+    std::uint32_t getGraphs(std::vector<GrrUviza*>& graphs) const;
+    std::vector<GrxLegend*> getLegends() const;
+    // Points, lines, edges, paths, intervals, areas, polygons, schemas: kind by kind.
+    static void getAllElements(const GrrUviza& graph, std::vector<CTElementType*>& elements);
+    void getAllElementsByType(const XMLCh* name, std::vector<CTElementType*>& elements) const;
+    std::vector<CTElementType*> getElementsWithSummaryStatistics(const GrrUviza& graph) const;
+    std::vector<CTAesthetic*> getAesthetics(const CTElementType& element) const;
+    // Intervals of the selected graphs that are polar exactly when `polar` is; returns the list's size.
+    std::uint32_t getIntervalElements(std::vector<GrxInterval*>& intervals, bool polar) const;
+    CTElementType* getFirstSPLOMElement(const GrrUviza& graph) const;
+
+    // Dimensions of role x, y, "y2" or z, counted with dimension references among each coordinates.
+    std::vector<GrxDimension*> getDimensionsByRole(const GrrUviza& graph, const ChartString& role) const;
+    CTVariableType* getElementVariable(const CTElementType& element, const ChartString& role) const;
+    void copyVariables(CTElementType& to, const CTElementType& from) const;
+    void addZDimension(GrrUviza& graph) const;
+
+    bool isGraphPolar(const GrrUviza& graph) const;
+    bool isGraphClustered(const GrrUviza& graph) const;
+    bool isChartTrue3D(const GrrUviza& graph) const;
+    bool isIntervalRangeElement(const CTElementType& element) const;
+    bool isAxisDerived(const GrxAxis& axis) const;
+    // Exactly "true" or "false"; anything else (absent, empty, "TRUE") gives `absent`.
+    static bool getBooleanAttribute(const XERCES_CPP_NAMESPACE::DOMElement* element, const XMLCh* name,
+                                    bool absent);
+    // Whether the element's coordinates are the coordinates at the given 0-based position.
+    bool doesCoordinateMatch(const CTElementType& element, const ChartString& number) const;
+    // Whether the nearest coordinates at or above the element are the first, or the second for "y2".
+    bool doesCoordinateMatch(const GrxBaseElement& element, const ChartString& name) const;
+
+    static const XMLCh* const _before;
+    static const XMLCh* const _casenum;
+    static const XMLCh* const _categoryValue;
+    static const XMLCh* const _clustered;
+    static const XMLCh* const _derived;
+    static const XMLCh* const _diffln;
+    static const XMLCh* const _dropline;
+    static const XMLCh* const _errorbar;
+    static const XMLCh* const _frameId;
+    static const XMLCh* const _gridLines;
+    static const XMLCh* const _hilo;
+    static const XMLCh* const _legendFrameStyle;
+    static const XMLCh* const _legendLabelStyle;
+    static const XMLCh* const _legendStyle;
+    static const XMLCh* const _legend_1;
+    static const XMLCh* const _multiple;
+    static const XMLCh* const _parentFrameId;
+    static const XMLCh* const _pie;
+    static const XMLCh* const _populationPyramid;
+    static const XMLCh* const _scalar;
+    static const XMLCh* const _scatter;
+    static const XMLCh* const _styleOnly;
+    static const XMLCh* const _textFrame;
+    static const XMLCh* const _tickLabelStyle;
+    static const XMLCh* const _when;
+    static const XMLCh* const _xaxis_title;
+    static const XMLCh* const _y2;
+    static const XMLCh* const _yaxis_title;
+    static const XMLCh* const _zaxis_title;
+
+protected:
+    GrxVisualization& target_;
+    const GrxVisualization* source_;
+    const XERCES_CPP_NAMESPACE::DOMElement* instruction_;
+};
+
+#endif
