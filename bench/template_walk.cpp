@@ -1,0 +1,219 @@
+// Template application beside its floor, in one run.
+// - applyTemplate: validated parse of the largest sample chart scaled to 1,000 elements, then a
+//   template of 500 instructions parsed (validated) and walked over it, then the chart printed once.
+//   Floor: the validated parse of the same chart and template and one serialisation, no walk.
+// - uniqueStyleId: the 10,000th and later "style<n>" ids of one visualization made with
+//   CreateUniqueId and given to a new style. Floor: the same new style with an id known beforehand.
+//   The first-free-number rule must not make each id cost a scan from 1.
+#include "foundation/ValidatingParser.h"
+#include "foundation/XercesRuntime.h"
+#include "templates/InstructionWalk.h"
+
+#include <plotaid/ChartBase.h>
+#include <plotaid/ChartTemplate.h>
+
+#include <grx/grx.h>
+
+#include <benchmark/benchmark.h>
+
+#include <xercesc/dom/DOM.hpp>
+
+#include <algorithm>
+#include <cstdio>
+#include <cstdlib>
+#include <fstream>
+#include <map>
+#include <memory>
+#include <sstream>
+#include <string>
+#include <vector>
+
+using namespace XERCES_CPP_NAMESPACE;
+
+namespace {
+
+constexpr std::size_t kChartElements = 1000;
+constexpr std::size_t kInstructions = 500;
+constexpr unsigned kStyles = 10000;
+constexpr double kApplyLimit = 3.0;
+constexpr double kUniqueIdLimit = 2.0;
+const std::string kSample = std::string(PLOTAID_EXAMPLES_DIR) + "/charts/scatterplot-matrix.xml";
+
+ChartException refused(const char* what) {
+    return ChartException(what, "bench/template_walk", 0);
+}
+
+// Gives every id of a copied subtree a suffix, so the copy validates beside the original.
+void renameIds(DOMElement* top, unsigned copy) {
+    std::vector<DOMElement*> pending{top};
+    while (!pending.empty()) {
+        DOMElement* e = pending.back();
+        pending.pop_back();
+        if (DOMAttr* id = e->getAttributeNode(GrxUni::_id)) {
+            ChartString renamed(id->getValue());
+            renamed.append(u"_").appendInteger(copy);
+            id->setValue(renamed.xc_str());
+        }
+        for (DOMElement* c = e->getFirstElementChild(); c; c = c->getNextElementSibling())
+            pending.push_back(c);
+    }
+}
+
+// The sample chart with copies of its graphs appended until it has kChartElements elements.
+const std::string& scaledChart() {
+    static const std::string text = [] {
+        std::ifstream in(kSample, std::ios::binary);
+        std::ostringstream sample;
+        sample << in.rdbuf();
+        plotaid::detail::ValidatingParser parser;
+        DOMDocument* doc = parser.parse(sample.str(), "bench", refused("sample chart"));
+        if (!doc)
+            return std::string();
+        DOMElement* root = doc->getDocumentElement();
+        std::vector<DOMElement*> graphs;
+        for (DOMElement* c = root->getFirstElementChild(); c; c = c->getNextElementSibling())
+            if (ChartString(c->getLocalName()).equals(GrxUni::_graph))
+                graphs.push_back(c);
+        const auto count = [&] { return doc->getElementsByTagName(u"*")->getLength(); };
+        for (unsigned copy = 1; count() < kChartElements && !graphs.empty(); ++copy)
+            for (DOMElement* g : graphs) {
+                auto* clone = static_cast<DOMElement*>(g->cloneNode(true));
+                renameIds(clone, copy);
+                root->appendChild(clone);
+            }
+        GrxVisualization vis(root);
+        return vis.AsUTF8();
+    }();
+    return text;
+}
+
+// kInstructions instructions cycling through every tag the walk knows.
+const std::string& bigTemplate() {
+    static const std::string text = [] {
+        std::string t = "<?xml version=\"1.0\" encoding=\"UTF-8\"?>\n"
+                        "<template xmlns=\"http://plotaid.org/grxml\" "
+                        "xmlns:xsi=\"http://www.w3.org/2001/XMLSchema-instance\" "
+                        "xsi:schemaLocation=\"http://plotaid.org/grxml "
+                        "http://plotaid.org/grxml/grxml-template-3.5.xsd\">\n";
+        const plotaid::detail::InstructionTable table = plotaid::detail::instructionTable();
+        for (std::size_t i = 0; i < kInstructions; ++i)
+            t += "  <" + ChartString(table.entries[i % table.count].tag).toUTF8() + " role=\"y\"/>\n";
+        return t + "</template>\n";
+    }();
+    return text;
+}
+
+void applyTemplate(benchmark::State& state) {
+    plotaid::detail::ValidatingParser parser;
+    for (auto _ : state) {
+        if (!parser.parse(scaledChart(), "bench", refused("chart"))) {
+            state.SkipWithError("the scaled chart does not validate");
+            return;
+        }
+        plotaid::detail::OwnedDocument doc = parser.adoptDocument();
+        GrxVisualization vis(doc.release()->getDocumentElement(), true);
+        ChartTemplate chartTemplate(vis, nullptr);
+        if (!chartTemplate.setTemplate(bigTemplate())) {
+            state.SkipWithError("the template does not validate");
+            return;
+        }
+        chartTemplate.applyTemplate();
+        benchmark::DoNotOptimize(vis.AsUTF8());
+    }
+}
+
+void applyTemplateFloor(benchmark::State& state) {
+    plotaid::detail::ValidatingParser chartParser, templateParser;
+    for (auto _ : state) {
+        if (!chartParser.parse(scaledChart(), "bench", refused("chart")) ||
+            !templateParser.parse(bigTemplate(), "bench", refused("template"))) {
+            state.SkipWithError("the inputs do not validate");
+            return;
+        }
+        plotaid::detail::OwnedDocument doc = chartParser.adoptDocument();
+        GrxVisualization vis(doc.release()->getDocumentElement(), true);
+        benchmark::DoNotOptimize(vis.AsUTF8());
+    }
+}
+
+// A visualization with style1 .. style<kStyles> made the way actions make them.
+std::unique_ptr<GrxVisualization> manyStyles(bool throughCreateUniqueId) {
+    auto vis = std::make_unique<GrxVisualization>(
+        ChartBase::createGrxDocument(ChartBase::_utf8)->getDocumentElement(), true);
+    for (unsigned n = 1; n <= kStyles; ++n) {
+        ChartString id("style");
+        id.appendInteger(n);
+        vis->addStyle().setId(throughCreateUniqueId ? ChartBase::CreateUniqueId(ChartString("style"), *vis)
+                                                    : id);
+    }
+    return vis;
+}
+
+void uniqueStyleId(benchmark::State& state) {
+    std::unique_ptr<GrxVisualization> vis = manyStyles(true);
+    for (auto _ : state)
+        vis->addStyle().setId(ChartBase::CreateUniqueId(ChartString("style"), *vis));
+}
+
+void uniqueStyleIdFloor(benchmark::State& state) {
+    std::unique_ptr<GrxVisualization> vis = manyStyles(false);
+    unsigned next = kStyles + 1;
+    for (auto _ : state) {
+        ChartString id("style");
+        id.appendInteger(next++);
+        vis->addStyle().setId(id);
+    }
+}
+
+BENCHMARK(applyTemplate)->Unit(benchmark::kMillisecond)->Repetitions(3);
+BENCHMARK(applyTemplateFloor)->Unit(benchmark::kMillisecond)->Repetitions(3);
+BENCHMARK(uniqueStyleId)->Iterations(10000)->Repetitions(3);
+BENCHMARK(uniqueStyleIdFloor)->Iterations(10000)->Repetitions(3);
+
+class BestTimes : public benchmark::ConsoleReporter {
+public:
+    void ReportRuns(const std::vector<Run>& runs) override {
+        for (const Run& run : runs) {
+            if (run.run_type != Run::RT_Iteration || run.error_occurred || run.iterations == 0)
+                continue;
+            const double perIteration = run.cpu_accumulated_time / static_cast<double>(run.iterations);
+            auto [it, inserted] = best.emplace(run.run_name.function_name, perIteration);
+            if (!inserted)
+                it->second = std::min(it->second, perIteration);
+        }
+        ConsoleReporter::ReportRuns(runs);
+    }
+    std::map<std::string, double> best;
+};
+
+bool within(const BestTimes& r, const char* measured, const char* floor, double limit) {
+    const auto m = r.best.find(measured);
+    const auto f = r.best.find(floor);
+    if (m == r.best.end() || f == r.best.end())
+        return true; // filtered out
+    const double ratio = m->second / f->second;
+    std::printf("%-20s %12.3f us  vs %-20s %12.3f us  ratio %.3f (limit %.2f)%s\n", measured, m->second * 1e6,
+                floor, f->second * 1e6, ratio, limit, ratio > limit ? "  TOO SLOW" : "");
+    return ratio <= limit;
+}
+
+} // namespace
+
+int main(int argc, char** argv) {
+    ::unsetenv("DumpChartXMLPath"); // measure the engine, not the error log's disk writes
+    plotaid::detail::XercesRuntime runtime;
+    benchmark::Initialize(&argc, argv);
+    if (benchmark::ReportUnrecognizedArguments(argc, argv))
+        return 1;
+    if (scaledChart().empty()) {
+        std::fprintf(stderr, "cannot scale %s\n", kSample.c_str());
+        return 1;
+    }
+    std::printf("scaled chart: %zu bytes, template: %zu instructions\n", scaledChart().size(), kInstructions);
+    BestTimes reporter;
+    benchmark::RunSpecifiedBenchmarks(&reporter);
+    benchmark::Shutdown();
+    const bool apply = within(reporter, "applyTemplate", "applyTemplateFloor", kApplyLimit);
+    const bool ids = within(reporter, "uniqueStyleId", "uniqueStyleIdFloor", kUniqueIdLimit);
+    return apply && ids ? 0 : 1;
+}
