@@ -63,6 +63,22 @@ TEST_F(ChartTemplateLoading, UnparsableCurrentFormFailsOnceWithTheTextAndApplies
     EXPECT_EQ(chart.vis->AsUTF8(), before);
 }
 
+TEST_F(ChartTemplateLoading, LogRecordsNameTheirSourceAndLine) {
+    foundation_test::DumpFolder dumps;
+    Chart chart = Chart::empty();
+    ChartTemplate t(*chart.vis, nullptr);
+    EXPECT_FALSE(t.setTemplate(templateOf("<setStyle>")));
+    ASSERT_TRUE(t.setTemplate(templateOf("<madeUp/>")));
+    t.applyTemplate();
+    const std::string log = dumps.log();
+    EXPECT_NE(log.find("Failed to parse template <?xml"), std::string::npos) << log;
+    EXPECT_NE(log.find("at file backend/chartxml/plotaid/src/templates/charttemplate, line 59"),
+              std::string::npos);
+    EXPECT_NE(log.find("Unsupported Template element encountered (<madeUp"), std::string::npos) << log;
+    EXPECT_NE(log.find("at file backend/chartxml/plotaid/src/templates/applytemplate, line 436"),
+              std::string::npos);
+}
+
 TEST_F(ChartTemplateLoading, InvalidInstructionContentIsRefusedByTheGrammar) {
     Chart chart = Chart::empty();
     ChartTemplate t(*chart.vis, nullptr);
