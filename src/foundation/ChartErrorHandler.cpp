@@ -1,8 +1,8 @@
 #include <plotaid/ChartErrorHandler.h>
 
+#include "foundation/HostText.h"
 #include "foundation/RecordSink.h"
 
-#include <osport/osport.h>
 #include <scratchloc/PathFactory.h>
 
 #include <xercesc/dom/DOMException.hpp>
@@ -22,6 +22,9 @@
 #include <sys/stat.h>
 
 using namespace XERCES_CPP_NAMESPACE;
+using plotaid::detail::toHost;
+using plotaid::detail::toWide;
+using plotaid::detail::WideText;
 
 namespace {
 
@@ -31,20 +34,6 @@ constexpr unsigned kDomLine = 253;
 constexpr unsigned kResolveLine = 300;
 // Schemas and document type definitions sit in this folder of the resource folder.
 const char* const kSchemaFolder = "schemas/";
-
-struct HostTextRelease {
-    void operator()(char* p) const { osport::KovarMBRelease(p); }
-};
-struct WideTextRelease {
-    void operator()(char16_t* p) const { osport::KovarMBRelease(p); }
-};
-
-std::string toHost(const XMLCh* text) {
-    if (text == nullptr)
-        return std::string();
-    const std::unique_ptr<char, HostTextRelease> converted(osport::KovarMBTranscodeGeneric(text));
-    return converted ? std::string(converted.get()) : std::string();
-}
 
 const char* domCodeText(int code) {
     switch (code) {
@@ -161,8 +150,7 @@ InputSource* ChartErrorHandler::resolveEntity(const XMLCh* const publicId, const
     (void)publicId;
     const int slash = systemId ? XMLString::lastIndexOf(systemId, chForwardSlash) : -1;
     const std::string file = slash > 0 ? resourceFile(systemId + slash + 1) : std::string();
-    const std::unique_ptr<char16_t, WideTextRelease> path(
-        file.empty() ? nullptr : osport::KovarMBTranscodeGeneric(file.c_str()));
+    const WideText path = file.empty() ? WideText() : toWide(file.c_str());
     if (!path) {
         LogMessage("Error -- ChartXML:",
                    "resolveEntity refused '" + printable(toHost(systemId)) +

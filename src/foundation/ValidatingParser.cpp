@@ -1,11 +1,11 @@
 #include "foundation/ValidatingParser.h"
 
+#include "foundation/HostText.h"
 #include "foundation/XercesRuntime.h"
 
 #include <plotaid/ChartBase.h>
 #include <plotaid/ChartErrorHandler.h>
 
-#include <osport/osport.h>
 
 #include <xercesc/dom/DOMDocument.hpp>
 #include <xercesc/dom/DOMException.hpp>
@@ -28,20 +28,6 @@ using namespace XERCES_CPP_NAMESPACE;
 namespace plotaid::detail {
 
 namespace {
-
-struct HostTextRelease {
-    void operator()(char* p) const { osport::KovarMBRelease(p); }
-};
-struct WideTextRelease {
-    void operator()(char16_t* p) const { osport::KovarMBRelease(p); }
-};
-
-std::string toHost(const XMLCh* text) {
-    if (text == nullptr)
-        return std::string();
-    const std::unique_ptr<char, HostTextRelease> converted(osport::KovarMBTranscodeGeneric(text));
-    return converted ? std::string(converted.get()) : std::string();
-}
 
 // A value that its data type rejects: the schema validator hands on the code of the data-type
 // validator's exception, in the exception-message domain.
@@ -97,8 +83,7 @@ private:
     // Reports a limit as a fatal error at the current position and stops the parse even when the
     // handler would let it go on.
     [[noreturn]] void refuse(const std::string& message) {
-        const std::unique_ptr<char16_t, WideTextRelease> text(
-            osport::KovarMBTranscodeGeneric(message.c_str()));
+        const WideText text = toWide(message.c_str());
         const Locator* where = getScanner()->getLocator();
         XercesDOMParser::error(0, XMLUni::fgXMLErrDomain, XMLErrorReporter::ErrType_Fatal, text.get(),
                                where ? where->getSystemId() : nullptr, where ? where->getPublicId() : nullptr,
