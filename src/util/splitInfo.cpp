@@ -2,6 +2,7 @@
 
 #include <feed/corekit.h>
 #include <feed/feed.h>
+#include <kovar/KovarGoToCaller.h>
 #include <kovar/kovarconv.h>
 #include <msgbook/FacSTDictionary.h>
 #include <scratchloc/PathFactory.h>
@@ -122,6 +123,8 @@ bool splitInfo::saveSplitInfo(feed::ProcDSIterator* cases, const feed::Procedure
             SplitEntry entry;
             if (impl_->readEntry(*cases, *source, i, entry))
                 impl_->entries.push_back(std::move(entry));
+        } catch (const KovarGoToCaller&) {
+            throw; // the host unwinding to its caller, not a failure of this variable
         } catch (...) {
             // One unreadable split variable must not cost the others.
         }
@@ -163,6 +166,8 @@ feed::BpHeading* splitInfo::activateSplit(feed::BpProcedure& procedure) const {
             composite.EndSublist();
         }
         return new feed::BpHeading(procedure.Heading(composite));
+    } catch (const KovarGoToCaller&) {
+        throw;
     } catch (...) {
         return nullptr;
     }

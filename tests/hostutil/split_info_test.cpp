@@ -1,6 +1,7 @@
 #include "TempDir.h"
 
 #include <feed/memory.h>
+#include <kovar/KovarGoToCaller.h>
 #include <kovar/kovarconv.h>
 #include <msgbook/FacSTDictionary.h>
 #include <plotaid/splitInfo.h>
@@ -135,10 +136,15 @@ TEST_F(SplitInfo, UnreadableSplitVariablesAreSkipped) {
 }
 
 namespace {
-// A variable whose host implementation fails.
+// A variable whose host implementation fails, or unwinds to the host's caller.
 class ThrowingVariable final : public feed::Kovar_Variable {
 public:
-    std::string GetName() const override { throw std::runtime_error("host failure"); }
+    bool unwind = false;
+    std::string GetName() const override {
+        if (unwind)
+            throw KovarGoToCaller(3);
+        throw std::runtime_error("host failure");
+    }
     std::string GetLabel() const override { return ""; }
     Kovar_Format GetFormat() const override { return Kovar_Format(5, 8, 0); }
     const feed::Kovar_ValueLabelMap* GetValueLabels() const override { return nullptr; }
@@ -148,6 +154,7 @@ public:
 class PartlyFailingSource final : public feed::ProcedureDataSource {
 public:
     explicit PartlyFailingSource(const feed::MemoryDataSource& inner) : inner_(inner) {}
+    void unwindInstead() { broken_.unwind = true; }
     int GetVariableCount() const override { return inner_.GetVariableCount() + 1; }
     const feed::Kovar_Variable* GetVariable(int index) const override {
         return index == 7 ? &broken_ : inner_.GetVariable(index);
@@ -169,6 +176,19 @@ TEST_F(SplitInfo, HostFailureOnOneVariableCostsOnlyThatVariable) {
     splitInfo info;
     EXPECT_TRUE(info.saveSplitInfo(&cases, &failing));
     EXPECT_EQ(info.getSplitLabel(true), "region = 3");
+}
+
+TEST_F(SplitInfo, HostUnwindingPassesThrough) {
+    PartlyFailingSource failing(source);
+    failing.unwindInstead();
+    cases.setNumber(7, 1.0);
+    splitInfo info;
+    try {
+        info.saveSplitInfo(&cases, &failing);
+        ADD_FAILURE() << "the host's unwinding was swallowed";
+    } catch (const KovarGoToCaller& e) {
+        EXPECT_EQ(e.code(), 3);
+    }
 }
 
 TEST_F(SplitInfo, NewCaseReplacesTheEntriesAndNullSourceKeepsThem) {
