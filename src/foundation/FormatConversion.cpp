@@ -3,12 +3,12 @@
 #include <plotaid/ChartException.h>
 #include <plotaid/Kovar_Format.h>
 
+#include "foundation/HostText.h"
 #include <grx/GrxModel.h>
 #include <grx/GrxUni.h>
 #include <kovar/kovarbase.h>
 #include <kovar/kovarconv.h>
 #include <kovar/kovarwin.h>
-#include <osport/osport.h>
 
 #include <algorithm>
 #include <cstdint>
@@ -83,10 +83,7 @@ void numericDate(GrxFormat& format, int width, const XMLCh* separators, int orde
 
 // Currency texts are the host's multibyte text, not necessarily UTF-8.
 ChartString hostText(const std::string& text) {
-    struct Release {
-        void operator()(char16_t* p) const { osport::KovarMBRelease(p); }
-    };
-    const std::unique_ptr<char16_t, Release> wide(osport::KovarMBTranscodeGeneric(text.c_str()));
+    const plotaid::detail::WideText wide = plotaid::detail::toWide(text.c_str());
     return wide ? ChartString(std::u16string(wide.get())) : ChartString(text);
 }
 
