@@ -93,6 +93,7 @@ std::unordered_map<const DOMDocument*, std::unordered_map<std::u16string, Unique
 std::atomic<std::uintptr_t> lastToken{0};
 // Bounds the hint table when documents come and go.
 constexpr std::size_t kMaxHintDocuments = 64;
+constexpr std::size_t kMaxHintPrefixes = 256;
 
 std::vector<plotaid::detail::XercesRuntime>& heldRuntimes() {
     static std::vector<plotaid::detail::XercesRuntime> held;
@@ -233,7 +234,10 @@ ChartString ChartBase::CreateUniqueId(const ChartString& base, const GrxVisualiz
     }
     if (table.size() >= kMaxHintDocuments && table.find(document) == table.end())
         table.clear();
-    UniqueIdHint& hint = table[document][base.str()];
+    auto& prefixes = table[document];
+    if (prefixes.size() >= kMaxHintPrefixes && prefixes.find(base.str()) == prefixes.end())
+        prefixes.clear();
+    UniqueIdHint& hint = prefixes[base.str()];
     hint.token = token;
     hint.next = n + 1;
     return candidate(n);
