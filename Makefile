@@ -25,7 +25,7 @@ test: build
 	ctest --test-dir $(BUILD) --output-on-failure -j $(JOBS)
 
 $(ASAN_BUILD)/build.ninja:
-	cmake -S . -B $(ASAN_BUILD) -G Ninja -DCMAKE_BUILD_TYPE=Debug -DPLOTAID_SANITIZE=ON $(CMAKE_FLAGS)
+	cmake -S . -B $(ASAN_BUILD) -G Ninja -DCMAKE_BUILD_TYPE=Debug -DPLOTAID_SANITIZE=ON -DPLOTAID_BUILD_BENCH=OFF $(CMAKE_FLAGS)
 
 # The install check is a packaging test; it says nothing more under the sanitizers.
 test-sanitize: deps $(ASAN_BUILD)/build.ninja
@@ -45,7 +45,7 @@ bench: deps $(BENCH_BUILD)/build.ninja
 
 $(FUZZ_BUILD)/build.ninja:
 	CC=clang CXX=clang++ cmake -S . -B $(FUZZ_BUILD) -G Ninja -DCMAKE_BUILD_TYPE=RelWithDebInfo \
-	  -DPLOTAID_BUILD_TESTS=OFF -DPLOTAID_BUILD_FUZZ=ON $(CMAKE_FLAGS)
+	  -DPLOTAID_BUILD_TESTS=OFF -DPLOTAID_BUILD_BENCH=OFF -DPLOTAID_BUILD_FUZZ=ON $(CMAKE_FLAGS)
 
 fuzz: deps $(FUZZ_BUILD)/build.ninja
 	cmake --build $(FUZZ_BUILD) -j $(JOBS)
