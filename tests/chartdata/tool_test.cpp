@@ -1,5 +1,5 @@
 #include "TestStreams.h"
-#include "tool/ToolRunner.h"
+#include "support/ToolRunner.h"
 
 #include <gtest/gtest.h>
 

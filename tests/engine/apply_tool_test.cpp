@@ -1,7 +1,7 @@
 #include "EngineSupport.h"
 
 #include "../foundation/FoundationSupport.h"
-#include "tool/ToolRunner.h"
+#include "support/ToolRunner.h"
 
 namespace {
 

@@ -1,6 +1,8 @@
 #ifndef PLOTAID_TESTS_FOUNDATION_SUPPORT_H
 #define PLOTAID_TESTS_FOUNDATION_SUPPORT_H
 
+#include "support/TestSupport.h"
+
 #include <cstdlib>
 #include <filesystem>
 #include <fstream>
@@ -12,53 +14,8 @@
 
 namespace foundation_test {
 
-// Sets (or, with nullopt, unsets) an environment variable and restores it on destruction.
-class ScopedEnv {
-public:
-    ScopedEnv(const char* name, const std::optional<std::string>& value) : name_(name) {
-        if (const char* old = std::getenv(name))
-            old_ = old;
-        if (value)
-            ::setenv(name, value->c_str(), 1);
-        else
-            ::unsetenv(name);
-    }
-    ~ScopedEnv() {
-        if (old_)
-            ::setenv(name_.c_str(), old_->c_str(), 1);
-        else
-            ::unsetenv(name_.c_str());
-    }
-    ScopedEnv(const ScopedEnv&) = delete;
-    ScopedEnv& operator=(const ScopedEnv&) = delete;
-
-private:
-    std::string name_;
-    std::optional<std::string> old_;
-};
-
-// A fresh folder, removed with everything in it on destruction.
-class TempDir {
-public:
-    TempDir() {
-        std::string pattern = (std::filesystem::temp_directory_path() / "plotaid-foundation-XXXXXX").string();
-        if (::mkdtemp(pattern.data()) != nullptr)
-            path_ = pattern;
-    }
-    ~TempDir() {
-        std::error_code ignored;
-        if (!path_.empty())
-            std::filesystem::remove_all(path_, ignored);
-    }
-    TempDir(const TempDir&) = delete;
-    TempDir& operator=(const TempDir&) = delete;
-
-    const std::string& path() const { return path_; }
-    std::string file(const std::string& name) const { return path_ + "/" + name; }
-
-private:
-    std::string path_;
-};
+using ::ScopedEnv;
+using ::TempDir;
 
 // The folder where the error log and the dumps go, switched on for the lifetime of the object.
 class DumpFolder {
@@ -70,12 +27,7 @@ public:
     std::string log() const { return read(dir_.file("chartxml_error.log")); }
     bool hasLog() const { return std::filesystem::exists(dir_.file("chartxml_error.log")); }
 
-    static std::string read(const std::string& file) {
-        std::ifstream in(file, std::ios::binary);
-        std::ostringstream text;
-        text << in.rdbuf();
-        return text.str();
-    }
+    static std::string read(const std::string& file) { return readAll(file); }
 
 private:
     TempDir dir_;

@@ -1,4 +1,4 @@
-#include "tool/ToolRunner.h"
+#include "support/ToolRunner.h"
 
 #include <gtest/gtest.h>
 

@@ -1,4 +1,4 @@
-#include "ToolRunner.h"
+#include "support/ToolRunner.h"
 
 #include <gtest/gtest.h>
 

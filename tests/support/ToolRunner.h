@@ -1,10 +1,19 @@
-#include "ToolRunner.h"
+#ifndef PLOTAID_TESTS_SUPPORT_TOOLRUNNER_H
+#define PLOTAID_TESTS_SUPPORT_TOOLRUNNER_H
 
 #include <array>
 #include <cstdio>
+#include <string>
+
 #include <sys/wait.h>
 
-ToolResult runTool(const std::string& args) {
+// Runs the command-line tool with a shell argument string; captures stdout+stderr and the exit code.
+struct ToolResult {
+    int exitCode = -1;
+    std::string output;
+};
+
+inline ToolResult runTool(const std::string& args) {
     ToolResult r;
     const std::string cmd = std::string("'") + PLOTAID_TOOL_PATH + "' " + args + " 2>&1";
     FILE* p = popen(cmd.c_str(), "r");
@@ -18,3 +27,5 @@ ToolResult runTool(const std::string& args) {
     r.exitCode = WIFEXITED(status) ? WEXITSTATUS(status) : -1;
     return r;
 }
+
+#endif
