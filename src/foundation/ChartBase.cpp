@@ -49,8 +49,10 @@ bool xercesUp() {
 }
 
 DOMDocument* newDocument(const XMLCh* rootName, const XMLCh* encoding, const XMLCh* schemaLocation) {
-    if (!xercesUp())
+    if (!xercesUp()) {
+        report("document creation failed: the XML parser library is not initialised", 60);
         return nullptr;
+    }
     DOMDocument* document = nullptr;
     try {
         DOMImplementation* implementation =

@@ -1,0 +1,2 @@
+// Compiles only if <plotaid/BaseTemplate.h> brings everything it needs.
+#include <plotaid/BaseTemplate.h>

@@ -1,0 +1,2 @@
+// Compiles only if <plotaid/ChartBase.h> brings everything it needs.
+#include <plotaid/ChartBase.h>
