@@ -91,6 +91,7 @@ const InstructionEntry kInstructions[] = {
 };
 
 thread_local WalkReport* currentReport = nullptr;
+thread_local ScopedInstructionTable* currentTable = nullptr;
 
 std::string printed(const DOMNode* node) {
     try {
@@ -120,6 +121,19 @@ std::string firstError(const RecordCollector& records) {
 
 InstructionTable instructionTable() noexcept {
     return {kInstructions, sizeof kInstructions / sizeof kInstructions[0]};
+}
+
+ScopedInstructionTable::ScopedInstructionTable(InstructionTable table) noexcept
+    : table_(table), outer_(currentTable) {
+    currentTable = this;
+}
+
+ScopedInstructionTable::~ScopedInstructionTable() {
+    currentTable = outer_;
+}
+
+InstructionTable ScopedInstructionTable::active() noexcept {
+    return currentTable != nullptr ? currentTable->table_ : instructionTable();
 }
 
 WalkReport::WalkReport() noexcept : outer_(currentReport) {

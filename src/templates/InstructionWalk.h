@@ -43,6 +43,23 @@ struct InstructionTable {
 // The 59 instruction tags, in the order the walk tests them.
 InstructionTable instructionTable() noexcept;
 
+// While one lives, walks on this thread use `table` instead of the 59 tags (for trying actions
+// out, and for tests of the walk's failure handling).
+class ScopedInstructionTable {
+public:
+    explicit ScopedInstructionTable(InstructionTable table) noexcept;
+    ~ScopedInstructionTable();
+    ScopedInstructionTable(const ScopedInstructionTable&) = delete;
+    ScopedInstructionTable& operator=(const ScopedInstructionTable&) = delete;
+
+    // The table in force on this thread.
+    static InstructionTable active() noexcept;
+
+private:
+    InstructionTable table_;
+    ScopedInstructionTable* outer_;
+};
+
 // What became of one instruction, for a template author.
 struct InstructionOutcome {
     enum Kind { Applied, Unsupported, Failed };
@@ -77,7 +94,7 @@ private:
 // action is made ends the walk with an exception, and the host's KovarGoToCaller passes through.
 void applyTemplateCommands(const GrxVisualization* source, GrxVisualization& target,
                            const XERCES_CPP_NAMESPACE::DOMElement* root,
-                           InstructionTable table = instructionTable());
+                           InstructionTable table = ScopedInstructionTable::active());
 
 } // namespace plotaid::detail
 

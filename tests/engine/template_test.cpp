@@ -346,6 +346,27 @@ TEST_F(InstructionWalk, EmptyTemplateOrNoRootChangesNothing) {
     EXPECT_EQ(chart_.vis->AsUTF8(), before);
 }
 
+TEST_F(InstructionWalk, ChartTemplateReportsAFatalWalkAndPassesTheHostsUnwinding) {
+    plotaid::detail::ScopedInstructionTable table({kTestTable, std::size(kTestTable)});
+    Records records;
+    ChartTemplate fatal(*chart_.vis, nullptr);
+    ASSERT_TRUE(fatal.setTemplate(templateOf("<record/><anyFault/><record/>")));
+    try {
+        fatal.applyTemplate();
+        ADD_FAILURE() << "no exception";
+    } catch (const ChartException& e) {
+        EXPECT_STREQ(e.what(), "Fatal Error occurred while applying template");
+        EXPECT_EQ(e.line(), 102u);
+    }
+    EXPECT_EQ(records.errors().back(), "Fatal Error occurred while applying template");
+    // What the first instruction did stays: nothing is rolled back.
+    EXPECT_EQ(ChartString(chart_.base().GetAttribute(u"steps")).toUTF8(), "x");
+
+    ChartTemplate host(*chart_.vis, nullptr);
+    ASSERT_TRUE(host.setTemplate(templateOf("<host/>")));
+    EXPECT_THROW(host.applyTemplate(), KovarGoToCaller);
+}
+
 TEST(InstructionTable, AllFiftyNineTagsInOrderEachDeclaredByTheGrammar) {
     const plotaid::detail::InstructionTable table = plotaid::detail::instructionTable();
     ASSERT_EQ(table.count, 59u);
