@@ -1,6 +1,7 @@
 #ifndef PLOTAID_TOOL_COMMAND_H
 #define PLOTAID_TOOL_COMMAND_H
 
+#include <cstddef>
 #include <string>
 #include <vector>
 
@@ -34,6 +35,8 @@ int usageError(const char* command, const std::string& message);
 int failure(const char* command, const std::string& message);
 
 // Whole-file I/O in binary mode; "-" names stdin or stdout. False with a readable reason.
+// No input the tool reads may be larger than this.
+constexpr std::size_t kMaxInputBytes = std::size_t(512) << 20;
 bool readFile(const std::string& path, std::string& out, std::string& error);
 bool writeFile(const std::string& path, const std::string& bytes, std::string& error);
 

@@ -25,7 +25,6 @@ namespace {
 
 constexpr const char* kName = "apply";
 // Larger inputs are refused before they are read into memory.
-constexpr std::size_t kMaxBytes = std::size_t(512) << 20;
 
 const char* outcomeText(detail::InstructionOutcome::Kind kind) {
     switch (kind) {
@@ -45,16 +44,6 @@ std::string oneLine(std::string text) {
         if (static_cast<unsigned char>(c) < 0x20)
             c = ' ';
     return text;
-}
-
-bool readInput(const std::string& path, std::string& text, std::string& error) {
-    if (!readFile(path, text, error))
-        return false;
-    if (text.size() > kMaxBytes) {
-        error = "larger than " + std::to_string(kMaxBytes) + " bytes";
-        return false;
-    }
-    return true;
 }
 
 int run(const Args& args) {
@@ -96,7 +85,7 @@ int run(const Args& args) {
         return usageError(kName, "no template given (--template TEMPLATE)");
 
     std::string chartText, error;
-    if (!readInput(chartPath, chartText, error))
+    if (!readFile(chartPath, chartText, error))
         return failure(kName, chartPath + ": " + error);
     detail::ValidatingParser parser;
     if (parser.parse(chartText, chartPath.c_str(),
@@ -115,7 +104,7 @@ int run(const Args& args) {
     bool allApplied = true;
     for (const std::string& path : templatePaths) {
         std::string text;
-        if (!readInput(path, text, error)) {
+        if (!readFile(path, text, error)) {
             std::fprintf(stderr, "plotaid %s: %s: %s\n", kName, path.c_str(), error.c_str());
             allApplied = false;
             continue;

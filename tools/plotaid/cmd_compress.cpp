@@ -7,14 +7,10 @@
 #include <cstdint>
 #include <cstdio>
 #include <string>
-#include <sys/stat.h>
 #include <unistd.h>
 
 namespace plotaid::tool {
 namespace {
-
-// Larger inputs are refused before they are read into memory.
-constexpr std::size_t kMaxInputBytes = std::size_t(512) << 20;
 
 struct Options {
     std::string input;
@@ -74,12 +70,6 @@ std::string parse(const Args& args, bool acceptsLimit, Options& options) {
     return std::string();
 }
 
-bool tooLarge(const std::string& path) {
-    struct stat st {};
-    return path != "-" && ::stat(path.c_str(), &st) == 0 && S_ISREG(st.st_mode) &&
-           static_cast<unsigned long long>(st.st_size) > kMaxInputBytes;
-}
-
 std::string describe(const std::string& path) {
     return path == "-" ? "standard input" : "'" + path + "'";
 }
@@ -92,9 +82,6 @@ void summarise(const char* verb, const Options& options, std::size_t in, std::si
 }
 
 int readInput(const char* command, const Options& options, std::string& bytes) {
-    if (tooLarge(options.input))
-        return failure(command, describe(options.input) + " is larger than " +
-                                    std::to_string(kMaxInputBytes >> 20) + " MiB");
     std::string error;
     if (!readFile(options.input, bytes, error))
         return failure(command, error);

@@ -6,6 +6,9 @@
 #include <iostream>
 #include <iterator>
 #include <sstream>
+#include <vector>
+
+#include <sys/stat.h>
 
 namespace plotaid::tool {
 
@@ -26,12 +29,17 @@ void printUsage(std::FILE* to) {
 }
 } // namespace
 
-Registrar::Registrar(const Command& command) { registry().push_back(command); }
+Registrar::Registrar(const Command& command) {
+    registry().push_back(command);
+}
 
-const std::vector<Command>& commands() { return registry(); }
+const std::vector<Command>& commands() {
+    return registry();
+}
 
 bool wantsHelp(const Args& args) {
-    return std::any_of(args.begin(), args.end(), [](const std::string& a) { return a == "--help" || a == "-h"; });
+    return std::any_of(args.begin(), args.end(),
+                       [](const std::string& a) { return a == "--help" || a == "-h"; });
 }
 
 int usageError(const char* command, const std::string& message) {
@@ -45,20 +53,38 @@ int failure(const char* command, const std::string& message) {
 }
 
 bool readFile(const std::string& path, std::string& out, std::string& error) {
-    if (path == "-") {
-        std::ostringstream s;
-        s << std::cin.rdbuf();
-        out = s.str();
-        return true;
-    }
-    std::ifstream in(path, std::ios::binary);
-    if (!in) {
-        error = "cannot open '" + path + "'";
+    const bool console = path == "-";
+    const std::string name = console ? std::string("standard input") : "'" + path + "'";
+    const std::string tooLarge = name + " is larger than " + std::to_string(kMaxInputBytes >> 20) + " MiB";
+    struct stat st {};
+    if (!console && ::stat(path.c_str(), &st) == 0 && S_ISREG(st.st_mode) &&
+        static_cast<unsigned long long>(st.st_size) > kMaxInputBytes) {
+        error = tooLarge;
         return false;
     }
-    out.assign(std::istreambuf_iterator<char>(in), std::istreambuf_iterator<char>());
+    std::ifstream file;
+    if (!console) {
+        file.open(path, std::ios::binary);
+        if (!file) {
+            error = "cannot open " + name;
+            return false;
+        }
+    }
+    std::istream& in = console ? std::cin : file;
+    // Read in slices so that a pipe or a growing file cannot exceed the cap either.
+    out.clear();
+    std::vector<char> slice(std::size_t(1) << 20);
+    while (in) {
+        in.read(slice.data(), static_cast<std::streamsize>(slice.size()));
+        out.append(slice.data(), static_cast<std::size_t>(in.gcount()));
+        if (out.size() > kMaxInputBytes) {
+            out.clear();
+            error = tooLarge;
+            return false;
+        }
+    }
     if (in.bad()) {
-        error = "cannot read '" + path + "'";
+        error = "cannot read " + name;
         return false;
     }
     return true;
