@@ -3,12 +3,13 @@
 // against its zlib counterpart's, and the program fails when one is more than 5% slower.
 #include <zpack/zpack.h>
 
+#include "BenchSupport.h"
+
 #include <benchmark/benchmark.h>
 #include <zlib.h>
 
 #include <algorithm>
 #include <cstdio>
-#include <map>
 #include <random>
 #include <string>
 #include <vector>
@@ -121,57 +122,19 @@ BENCHMARK(zlibUncompress)->Unit(benchmark::kMillisecond)->Repetitions(5);
 BENCHMARK(wrapperDecompress)->Unit(benchmark::kMillisecond)->Repetitions(5);
 BENCHMARK(wrapperDecompressExpectedLength)->Unit(benchmark::kMillisecond)->Repetitions(5);
 
-// Keeps the best time per benchmark while the console shows everything as usual.
-class BestTimes : public benchmark::ConsoleReporter {
-public:
-    void ReportRuns(const std::vector<Run>& runs) override {
-        for (const Run& run : runs) {
-            if (run.run_type != Run::RT_Iteration || run.error_occurred || run.iterations == 0)
-                continue;
-            // CPU time: the machine is shared, and time spent descheduled is nobody's cost here.
-            const double perIteration = run.cpu_accumulated_time / static_cast<double>(run.iterations);
-            auto [it, inserted] = best.emplace(run.run_name.function_name, perIteration);
-            if (!inserted)
-                it->second = std::min(it->second, perIteration);
-        }
-        ConsoleReporter::ReportRuns(runs);
-    }
-    std::map<std::string, double> best;
-};
-
 } // namespace
 
 int main(int argc, char** argv) {
-    std::vector<char*> args(argv, argv + argc);
-    char interleave[] = "--benchmark_enable_random_interleaving=true";
-    args.insert(args.begin() + 1, interleave); // the caller's own flags come later and win
-    int count = static_cast<int>(args.size());
-    benchmark::Initialize(&count, args.data());
-    if (benchmark::ReportUnrecognizedArguments(count, args.data()))
+    if (!bench::initialize(argc, argv))
         return 1;
     std::printf("text: %zu bytes, compressed: %zu bytes\n", chartText().size(), packedText().size());
-    BestTimes reporter;
-    benchmark::RunSpecifiedBenchmarks(&reporter);
+    bench::BestTimes times;
+    benchmark::RunSpecifiedBenchmarks(&times);
     benchmark::Shutdown();
 
-    const struct {
-        const char* wrapper;
-        const char* floor;
-    } pairs[] = {{"wrapperCompress", "zlibCompress"},
-                 {"wrapperDecompress", "zlibUncompress"},
-                 {"wrapperDecompressExpectedLength", "zlibUncompress"}};
-    bool within = true;
-    for (const auto& pair : pairs) {
-        const auto w = reporter.best.find(pair.wrapper);
-        const auto f = reporter.best.find(pair.floor);
-        if (w == reporter.best.end() || f == reporter.best.end())
-            continue; // filtered out
-        const double mbps = static_cast<double>(chartText().size()) / 1e6;
-        const double ratio = w->second / f->second;
-        std::printf("%-32s %8.1f MB/s  vs zlib %8.1f MB/s  ratio %.3f (limit %.2f)%s\n", pair.wrapper,
-                    mbps / w->second, mbps / f->second, ratio, kAllowedRatio,
-                    ratio > kAllowedRatio ? "  TOO SLOW" : "");
-        within = within && ratio <= kAllowedRatio;
-    }
-    return within ? 0 : 1;
+    const double mb = static_cast<double>(chartText().size()) / 1e6;
+    bool ok = bench::within(times, "wrapperCompress", "zlibCompress", kAllowedRatio, mb);
+    ok = bench::within(times, "wrapperDecompress", "zlibUncompress", kAllowedRatio, mb) && ok;
+    ok = bench::within(times, "wrapperDecompressExpectedLength", "zlibUncompress", kAllowedRatio, mb) && ok;
+    return ok ? 0 : 1;
 }

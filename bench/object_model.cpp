@@ -6,6 +6,8 @@
 // floor: random look-ups into 100,000 entries already miss the caches; a scan would grow 100-fold).
 #include <grx/grx.h>
 
+#include "BenchSupport.h"
+
 #include <benchmark/benchmark.h>
 
 #include <xercesc/dom/DOMAttr.hpp>
@@ -25,7 +27,6 @@
 #include <algorithm>
 #include <cstdio>
 #include <fstream>
-#include <map>
 #include <memory>
 #include <random>
 #include <sstream>
@@ -193,67 +194,28 @@ BENCHMARK(wrap)->Unit(benchmark::kMillisecond)->Repetitions(5);
 BENCHMARK(getElementById)->Arg(1000)->Arg(100000)->Repetitions(5);
 BENCHMARK(hashMapLookup)->Arg(1000)->Arg(100000)->Repetitions(5);
 
-class BestTimes : public benchmark::ConsoleReporter {
-public:
-    void ReportRuns(const std::vector<Run>& runs) override {
-        for (const Run& run : runs) {
-            if (run.run_type != Run::RT_Iteration || run.error_occurred || run.iterations == 0)
-                continue;
-            const double perIteration = run.cpu_accumulated_time / static_cast<double>(run.iterations);
-            const std::string name =
-                run.run_name.function_name + (run.run_name.args.empty() ? "" : "/" + run.run_name.args);
-            auto [it, inserted] = best.emplace(name, perIteration);
-            if (!inserted)
-                it->second = std::min(it->second, perIteration);
-        }
-        ConsoleReporter::ReportRuns(runs);
-    }
-    std::map<std::string, double> best;
-};
-
-double best(const BestTimes& r, const char* name) {
-    const auto it = r.best.find(name);
-    return it == r.best.end() ? 0.0 : it->second;
-}
-
-bool within(const BestTimes& r, const char* measured, const char* floor, double limit) {
-    const auto m = r.best.find(measured);
-    const auto f = r.best.find(floor);
-    if (m == r.best.end() || f == r.best.end())
-        return true; // filtered out
-    const double ratio = m->second / f->second;
-    std::printf("%-24s %12.3f us  vs %-24s %12.3f us  ratio %.3f (limit %.2f)%s\n", measured, m->second * 1e6,
-                floor, f->second * 1e6, ratio, limit, ratio > limit ? "  TOO SLOW" : "");
-    return ratio <= limit;
-}
-
 } // namespace
 
 int main(int argc, char** argv) {
     XMLPlatformUtils::Initialize();
     bool ok = true;
     {
-        std::vector<char*> args(argv, argv + argc);
-        char interleave[] = "--benchmark_enable_random_interleaving=true";
-        args.insert(args.begin() + 1, interleave);
-        int count = static_cast<int>(args.size());
-        benchmark::Initialize(&count, args.data());
-        if (benchmark::ReportUnrecognizedArguments(count, args.data()))
+        if (!bench::initialize(argc, argv))
             return 1;
         if (scaledChart().empty()) {
             std::fprintf(stderr, "cannot scale %s\n", kSample.c_str());
             return 1;
         }
         std::printf("scaled chart: %zu bytes\n", scaledChart().size());
-        BestTimes reporter;
+        bench::BestTimes reporter;
         benchmark::RunSpecifiedBenchmarks(&reporter);
         benchmark::Shutdown();
-        const bool wrapping = within(reporter, "wrap", "validatedParse", kWrapLimit);
+        const bool wrapping = bench::within(reporter, "wrap", "validatedParse", kWrapLimit);
         bool lookup = true;
-        const double dom1k = best(reporter, "getElementById/1000"),
-                     dom100k = best(reporter, "getElementById/100000");
-        const double map1k = best(reporter, "hashMapLookup/1000"),
-                     map100k = best(reporter, "hashMapLookup/100000");
+        const double dom1k = reporter.best("getElementById/1000"),
+                     dom100k = reporter.best("getElementById/100000");
+        const double map1k = reporter.best("hashMapLookup/1000"),
+                     map100k = reporter.best("hashMapLookup/100000");
         if (dom1k > 0 && dom100k > 0 && map1k > 0 && map100k > 0) {
             const double growth = (dom100k / dom1k) / (map100k / map1k);
             std::printf("getElementById %8.1f ns at 1,000 ids, %8.1f ns at 100,000 (x%.2f); hash map x%.2f; "

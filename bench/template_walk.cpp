@@ -14,6 +14,8 @@
 
 #include <grx/grx.h>
 
+#include "BenchSupport.h"
+
 #include <benchmark/benchmark.h>
 
 #include <xercesc/dom/DOM.hpp>
@@ -22,7 +24,6 @@
 #include <cstdio>
 #include <cstdlib>
 #include <fstream>
-#include <map>
 #include <memory>
 #include <sstream>
 #include <string>
@@ -170,50 +171,22 @@ BENCHMARK(applyTemplateFloor)->Unit(benchmark::kMillisecond)->Repetitions(3);
 BENCHMARK(uniqueStyleId)->Iterations(10000)->Repetitions(3);
 BENCHMARK(uniqueStyleIdFloor)->Iterations(10000)->Repetitions(3);
 
-class BestTimes : public benchmark::ConsoleReporter {
-public:
-    void ReportRuns(const std::vector<Run>& runs) override {
-        for (const Run& run : runs) {
-            if (run.run_type != Run::RT_Iteration || run.error_occurred || run.iterations == 0)
-                continue;
-            const double perIteration = run.cpu_accumulated_time / static_cast<double>(run.iterations);
-            auto [it, inserted] = best.emplace(run.run_name.function_name, perIteration);
-            if (!inserted)
-                it->second = std::min(it->second, perIteration);
-        }
-        ConsoleReporter::ReportRuns(runs);
-    }
-    std::map<std::string, double> best;
-};
-
-bool within(const BestTimes& r, const char* measured, const char* floor, double limit) {
-    const auto m = r.best.find(measured);
-    const auto f = r.best.find(floor);
-    if (m == r.best.end() || f == r.best.end())
-        return true; // filtered out
-    const double ratio = m->second / f->second;
-    std::printf("%-20s %12.3f us  vs %-20s %12.3f us  ratio %.3f (limit %.2f)%s\n", measured, m->second * 1e6,
-                floor, f->second * 1e6, ratio, limit, ratio > limit ? "  TOO SLOW" : "");
-    return ratio <= limit;
-}
-
 } // namespace
 
 int main(int argc, char** argv) {
     ::unsetenv("DumpChartXMLPath"); // measure the engine, not the error log's disk writes
     plotaid::detail::XercesRuntime runtime;
-    benchmark::Initialize(&argc, argv);
-    if (benchmark::ReportUnrecognizedArguments(argc, argv))
+    if (!bench::initialize(argc, argv))
         return 1;
     if (scaledChart().empty()) {
         std::fprintf(stderr, "cannot scale %s\n", kSample.c_str());
         return 1;
     }
     std::printf("scaled chart: %zu bytes, template: %zu instructions\n", scaledChart().size(), kInstructions);
-    BestTimes reporter;
+    bench::BestTimes reporter;
     benchmark::RunSpecifiedBenchmarks(&reporter);
     benchmark::Shutdown();
-    const bool apply = within(reporter, "applyTemplate", "applyTemplateFloor", kApplyLimit);
-    const bool ids = within(reporter, "uniqueStyleId", "uniqueStyleIdFloor", kUniqueIdLimit);
+    const bool apply = bench::within(reporter, "applyTemplate", "applyTemplateFloor", kApplyLimit);
+    const bool ids = bench::within(reporter, "uniqueStyleId", "uniqueStyleIdFloor", kUniqueIdLimit);
     return apply && ids ? 0 : 1;
 }
