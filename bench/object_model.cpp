@@ -7,6 +7,7 @@
 #include <grx/grx.h>
 
 #include "BenchSupport.h"
+#include "ScaledChart.h"
 
 #include <benchmark/benchmark.h>
 
@@ -83,46 +84,8 @@ std::size_t countElements(const DOMDocument* doc) {
     return doc->getElementsByTagName(u"*")->getLength();
 }
 
-// Gives every id of a copied subtree a suffix, so the copy validates beside the original.
-void renameIds(DOMElement* top, unsigned copy) {
-    std::vector<DOMElement*> pending{top};
-    while (!pending.empty()) {
-        DOMElement* e = pending.back();
-        pending.pop_back();
-        if (DOMAttr* id = e->getAttributeNode(GrxUni::_id)) {
-            ChartString renamed(id->getValue());
-            renamed.append(u"_").appendInteger(copy);
-            id->setValue(renamed.xc_str());
-        }
-        for (DOMElement* c = e->getFirstElementChild(); c; c = c->getNextElementSibling())
-            pending.push_back(c);
-    }
-}
-
-// The sample chart with copies of its graphs appended until it has kElements elements.
 const std::string& scaledChart() {
-    static const std::string text = [] {
-        std::ifstream in(kSample, std::ios::binary);
-        std::ostringstream sample;
-        sample << in.rdbuf();
-        Parser parser;
-        DOMDocument* doc = parser.parse(sample.str());
-        if (!doc)
-            return std::string();
-        DOMElement* root = doc->getDocumentElement();
-        std::vector<DOMElement*> graphs;
-        for (DOMElement* c = root->getFirstElementChild(); c; c = c->getNextElementSibling())
-            if (ChartString(c->getLocalName()).equals(GrxUni::_graph))
-                graphs.push_back(c);
-        for (unsigned copy = 1; countElements(doc) < kElements && !graphs.empty(); ++copy)
-            for (DOMElement* g : graphs) {
-                auto* clone = static_cast<DOMElement*>(g->cloneNode(true));
-                renameIds(clone, copy);
-                root->appendChild(clone);
-            }
-        GrxVisualization vis(root);
-        return vis.AsUTF8();
-    }();
+    static const std::string text = bench::scaleChart(kSample, kElements);
     return text;
 }
 
