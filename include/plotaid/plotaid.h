@@ -8,11 +8,15 @@
 #include <plotaid/ChartException.h>
 #include <plotaid/ChartKey.h>
 #include <plotaid/ChartTemplate.h>
+#include <plotaid/ChartTransformer.h>
 #include <plotaid/Kovar_Format.h>
 #include <plotaid/splitInfo.h>
 #include <plotaid/TimeConverter.h>
 #include <plotaid/TimeStamp.h>
+#include <plotaid/TreeEntityResolver.h>
+#include <plotaid/TreeTransformer.h>
 #include <plotaid/VarDataProcessor.h>
 #include <plotaid/XmlDataHandler.h>
+#include <plotaid/xmlString.h>
 
 #endif

@@ -1,19 +1,11 @@
-// plotaid apply --chart CHART --template T [--template ...] [-o OUT] [--report]: applies templates
-// to a chart in order and writes the chart.
+// plotaid apply --chart CHART [--data DATA] --template T [--template ...] [-o OUT] [--entire]
+// [--compressed] [--report]: applies templates to a chart with its data, in order, and writes it.
+#include "ChartInput.h"
 #include "Command.h"
 
-#include "foundation/ValidatingParser.h"
 #include "templates/InstructionWalk.h"
 
-#include <plotaid/ChartException.h>
-#include <plotaid/ChartTemplate.h>
-
-#include <grx/GrxVisualization.h>
-
-#include <kovar/KovarGoToCaller.h>
-
-#include <xercesc/dom/DOMDocument.hpp>
-#include <xercesc/dom/DOMElement.hpp>
+#include <plotaid/ChartTransformer.h>
 
 #include <cstdio>
 #include <memory>
@@ -24,7 +16,6 @@ namespace plotaid::tool {
 namespace {
 
 constexpr const char* kName = "apply";
-// Larger inputs are refused before they are read into memory.
 
 const char* outcomeText(detail::InstructionOutcome::Kind kind) {
     switch (kind) {
@@ -49,10 +40,16 @@ std::string oneLine(std::string text) {
 int run(const Args& args) {
     if (wantsHelp(args)) {
         std::printf(
-            "usage: plotaid apply --chart CHART --template TEMPLATE [--template ...] [-o OUT] [--report]\n\n"
+            "usage: plotaid apply --chart CHART [--data DATA] --template TEMPLATE [--template ...]\n"
+            "                     [-o OUT] [--entire] [--compressed] [--report]\n\n"
             "Applies each template to the chart, in the order given, and writes the chart to OUT\n"
-            "(standard output when -o is not given or is \"-\"). The chart must be valid chart XML;\n"
-            "templates of the earlier form are converted first.\n\n"
+            "(standard output when -o is not given or is \"-\"). The chart must be valid chart XML,\n"
+            "plain or compressed; templates of the earlier form are converted first.\n\n"
+            "--data DATA  the chart's data: a data stream or an XML data document, plain or compressed.\n"
+            "             Without it, the data sources held in the chart itself are its data.\n"
+            "The chart is written with its data sources as references unless --entire is given,\n"
+            "which writes the whole document with the data put back in place of the references.\n"
+            "--compressed writes it compressed (zlib).\n\n"
             "--report prints one line per instruction: the template, the instruction's position\n"
             "among the template's instructions, its tag, and what became of it:\n"
             "  applied          the action ran and reported no error\n"
@@ -62,20 +59,26 @@ int run(const Args& args) {
             "Exit status: 0 when every template was read and applied, 1 otherwise, 2 on a usage error.\n");
         return kOk;
     }
-    std::string chartPath, outPath = "-";
+    std::string chartPath, dataPath, outPath = "-";
     std::vector<std::string> templatePaths;
-    bool report = false;
+    bool report = false, entire = false, packed = false;
     for (std::size_t i = 0; i < args.size(); ++i) {
         const std::string& a = args[i];
         const bool hasValue = i + 1 < args.size();
         if (a == "--chart" && hasValue)
             chartPath = args[++i];
+        else if (a == "--data" && hasValue)
+            dataPath = args[++i];
         else if (a == "--template" && hasValue)
             templatePaths.push_back(args[++i]);
         else if ((a == "-o" || a == "--output") && hasValue)
             outPath = args[++i];
         else if (a == "--report")
             report = true;
+        else if (a == "--entire")
+            entire = true;
+        else if (a == "--compressed")
+            packed = true;
         else
             return usageError(kName, "unexpected argument '" + a + "'");
     }
@@ -84,21 +87,13 @@ int run(const Args& args) {
     if (templatePaths.empty())
         return usageError(kName, "no template given (--template TEMPLATE)");
 
-    std::string chartText, error;
-    if (!readFile(chartPath, chartText, error))
-        return failure(kName, chartPath + ": " + error);
-    detail::ValidatingParser parser;
-    if (parser.parse(chartText, chartPath.c_str(),
-                     ChartException("chart could not be read: " + chartPath, "tools/plotaid/cmd_apply", 0)) ==
-        nullptr) {
-        const std::vector<std::string>& errors = parser.lastErrors();
-        return failure(kName,
-                       chartPath + ": " + (errors.empty() ? std::string("not valid") : errors.front()));
-    }
-    detail::OwnedDocument document = parser.adoptDocument();
-    XERCES_CPP_NAMESPACE::DOMElement* root = document->getDocumentElement();
-    GrxVisualization visualization(root, true);
-    document.release(); // the visualization owns it now
+    std::string error;
+    ChartInput input;
+    if (!input.load(chartPath, dataPath, error))
+        return failure(kName, error);
+    ChartTransformer& chart = input.transformer();
+    if (input.hasData() && chart.getCompressedData().empty())
+        return failure(kName, dataPath + ": the data cannot be read as chart data");
 
     FILE* reportOut = outPath == "-" ? stderr : stdout;
     bool allApplied = true;
@@ -110,21 +105,14 @@ int run(const Args& args) {
             continue;
         }
         detail::WalkReport outcomes;
-        try {
-            ChartTemplate chartTemplate(visualization, nullptr);
-            if (!chartTemplate.setTemplate(text)) {
-                std::fprintf(stderr, "plotaid %s: %s: the template could not be parsed\n", kName,
-                             path.c_str());
-                allApplied = false;
+        if (!chart.applyTemplate(text)) {
+            // A walk that started reports its instructions; one that did not never read the template.
+            std::fprintf(stderr, "plotaid %s: %s: %s\n", kName, path.c_str(),
+                         outcomes.outcomes().empty() ? "the template could not be parsed"
+                                                     : "application abandoned");
+            allApplied = false;
+            if (outcomes.outcomes().empty())
                 continue;
-            }
-            chartTemplate.applyTemplate();
-        } catch (const KovarGoToCaller&) {
-            std::fprintf(stderr, "plotaid %s: %s: application abandoned\n", kName, path.c_str());
-            allApplied = false;
-        } catch (const std::exception& e) {
-            std::fprintf(stderr, "plotaid %s: %s: %s\n", kName, path.c_str(), e.what());
-            allApplied = false;
         }
         if (!report)
             continue;
@@ -136,7 +124,10 @@ int run(const Args& args) {
             std::fprintf(reportOut, "%s: no instructions\n", path.c_str());
     }
 
-    const std::string written = visualization.AsUTF8();
+    const std::string text = entire ? chart.getEntireXML(u"UTF-8") : chart.getXML();
+    if (text.empty())
+        return failure(kName, "the chart could not be written");
+    const std::string written = packed ? compressed(text) : text;
     if (!writeFile(outPath, written, error))
         return failure(kName, outPath + ": " + error);
     std::fflush(stdout);

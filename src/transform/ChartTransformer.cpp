@@ -1,0 +1,426 @@
+// The chart transformer: a chart kept apart from its data sources, merged back on request.
+#include <plotaid/ChartTransformer.h>
+
+#include "foundation/ValidatingParser.h"
+
+#include <plotaid/ChartErrorHandler.h>
+#include <plotaid/ChartException.h>
+#include <plotaid/ChartTemplate.h>
+#include <plotaid/XmlDataHandler.h>
+
+#include <grx/ChartPrinter.h>
+#include <grx/ChartString.h>
+#include <grx/GrxUni.h>
+#include <grx/GrxVisualization.h>
+
+#include <zpack/zpack.h>
+
+#include <xercesc/dom/DOM.hpp>
+#include <xercesc/util/XMLChar.hpp>
+#include <xercesc/util/XMLString.hpp>
+
+#include <cstdlib>
+#include <cstring>
+#include <sstream>
+#include <vector>
+
+using namespace XERCES_CPP_NAMESPACE;
+
+namespace {
+
+const char* const kFile = "backend/chartxml/plotaid/src/charttransformer";
+const char* const kBaseFile = "backend/chartxml/plotaid/src/chartbase";
+
+constexpr XMLCh kUtf8[] = u"UTF-8";
+constexpr XMLCh kGraphSources[] = u"graphSources";
+
+// Process-wide dump counters: one shared by the template dumps of one application, one for popups.
+int templateDumpCount = 1;
+int popupDumpCount = 1;
+
+void report(const std::string& message, int line) {
+    ChartErrorHandler().error(ChartException(message, kFile, line));
+}
+
+bool dumpsWanted() {
+    return std::getenv("DumpChartXMLPath") != nullptr;
+}
+
+std::string utf8(const XMLCh* text) {
+    return text != nullptr ? ChartString(text).toUTF8() : std::string();
+}
+
+bool sameText(const XMLCh* a, const XMLCh* b) {
+    return XMLString::equals(a, b);
+}
+
+// The popup template: one "addPopups" instruction for every axis and the legend.
+const char* const kPopupTemplate =
+    "<?xml version=\"1.0\" encoding=\"UTF-8\" standalone=\"no\"?>\n"
+    "<template Kovar-Version=\"2.10\" xmlns=\"http://plotaid.org/grxml\" "
+    "xmlns:xsi=\"http://www.w3.org/2001/XMLSchema-instance\" "
+    "xsi:schemaLocation=\"http://plotaid.org/grxml http://plotaid.org/grxml/grxml-template-3.5.xsd\">"
+    "<addPopups x=\"true\" y=\"true\" z=\"true\" legend=\"true\"/></template>\n";
+
+// Source ids are XML ids in both grammars; a name that is not one would make the data document
+// invalid for any other reader, and could never match a chart's reference anyway.
+bool allSourceIdsAreNames(const DOMElement* root, std::string& bad) {
+    for (const DOMElement* e = root->getFirstElementChild(); e != nullptr; e = e->getNextElementSibling()) {
+        const XMLCh* id = e->getAttribute(GrxUni::_id);
+        if (id == nullptr || *id == 0)
+            continue;
+        if (!XMLChar1_0::isValidNCName(id, XMLString::stringLen(id))) {
+            bad = utf8(id);
+            return false;
+        }
+    }
+    return true;
+}
+
+// The printer does not count the data root's own default-namespace declaration, so it declares the
+// chart namespace again on every source. Readers of data documents look for a source's start tag
+// as "<embeddedSource id=", so the repeated declaration goes: escaping keeps "<" out of text and
+// attribute values, so only start tags can match, and all sources sit right under the root.
+void dropRepeatedNamespace(std::string& text) {
+    static const char* const kTags[] = {"userSource", "databaseSource", "delimitedFileSource",
+                                        "streamingSource", "embeddedSource"};
+    for (const char* tag : kTags) {
+        const std::string repeated = std::string("<") + tag + " xmlns=\"http://plotaid.org/grxml\"";
+        const std::string plain = std::string("<") + tag;
+        std::string out;
+        std::size_t from = 0;
+        for (std::size_t at; (at = text.find(repeated, from)) != std::string::npos;
+             from = at + repeated.size()) {
+            out.append(text, from, at - from);
+            out += plain;
+        }
+        if (from == 0)
+            continue;
+        out.append(text, from, std::string::npos);
+        text.swap(out);
+    }
+}
+
+bool isDataRoot(const DOMElement* root) {
+    return root != nullptr && sameText(root->getLocalName(), kGraphSources) &&
+           sameText(root->getNamespaceURI(), ChartBase::_schemaDatabLocationValue);
+}
+
+} // namespace
+
+ChartTransformer::ChartTransformer(const std::string& xml) {
+    try {
+        if (xml.empty() || !buildVisualization(xml))
+            return;
+        moveSourcesToData();
+    } catch (...) {
+        visualization_.reset();
+        data_.clear();
+        report("ChartTransformer ctor fatal error", 120);
+    }
+}
+
+ChartTransformer::ChartTransformer(const std::string& compressedXml, const std::string& compressedData)
+    : data_(compressedData) {
+    try {
+        if (compressedXml.empty() || static_cast<unsigned char>(compressedXml[0]) != 0x78)
+            return;
+        std::string text;
+        if (!zpack::decompressString(text, compressedXml))
+            return;
+        buildVisualization(text.empty() ? compressedXml : text);
+    } catch (...) {
+        visualization_.reset(); // silently: the host sees a transformer without a chart
+    }
+}
+
+ChartTransformer::ChartTransformer(const std::string& compressedXml, const unsigned char* dataStream,
+                                   unsigned int length)
+    : dataStream_(dataStream), dataStreamLength_(dataStream != nullptr ? length : 0) {
+    try {
+        std::string text;
+        if (!zpack::decompressString(text, compressedXml))
+            return;
+        buildVisualization(text);
+    } catch (...) {
+        visualization_.reset();
+        report("ChartTransformer ctor fatal error", 260);
+    }
+}
+
+ChartTransformer::~ChartTransformer() = default;
+
+bool ChartTransformer::buildVisualization(const std::string& text) {
+    if (text.empty())
+        return false;
+    // The chart needs a parser of its own: the visualization keeps the document, while the
+    // builder's parser is reused for data documents.
+    plotaid::detail::ValidatingParser parser;
+    DOMDocument* parsed = parser.parse(
+        text, "ChartBase", ChartException("parseDocument fatal error while parsing", kBaseFile, 1105));
+    if (parsed == nullptr)
+        return false;
+    DOMElement* root = parsed->getDocumentElement();
+    if (root == nullptr || !sameText(root->getLocalName(), GrxUni::_visualization)) {
+        report("ChartTransformer: the document is not a chart (root " +
+                   utf8(root ? root->getTagName() : nullptr) + ")",
+               140);
+        return false;
+    }
+    plotaid::detail::OwnedDocument owned = parser.adoptDocument();
+    visualization_ = std::make_unique<GrxVisualization>(root, true);
+    owned.release(); // the visualization releases it
+    document_ = root->getOwnerDocument();
+    return true;
+}
+
+void ChartTransformer::moveSourcesToData() {
+    GrxVisualization& vis = *visualization_;
+    std::vector<GrxBaseElement*> sources;
+    for (GrxBaseElement* s : vis.getUserSources())
+        sources.push_back(s);
+    for (GrxBaseElement* s : vis.getDatabaseSources())
+        sources.push_back(s);
+    for (GrxBaseElement* s : vis.getDelimitedFileSources())
+        sources.push_back(s);
+    for (GrxBaseElement* s : vis.getStreamingSources())
+        sources.push_back(s);
+    const std::vector<GrxEmbeddedSource*> embedded = vis.getEmbeddedSources();
+    for (GrxBaseElement* s : embedded)
+        sources.push_back(s);
+    if (sources.empty())
+        return;
+
+    DOMDocument* dataDocument = createDataDocument(kUtf8);
+    if (dataDocument == nullptr || dataDocument->getDocumentElement() == nullptr) {
+        releaseDocument(dataDocument);
+        report("ChartTransformer: no data document could be made", 180);
+        return;
+    }
+    DOMElement* dataRoot = dataDocument->getDocumentElement();
+    for (GrxBaseElement* s : sources)
+        dataRoot->appendChild(dataDocument->importNode(s->getImplementation(), true));
+
+    // An embedded source without an id could never be found again, so it stays in the chart.
+    std::vector<ChartString> moved;
+    for (GrxEmbeddedSource* s : embedded) {
+        const XMLCh* id = s->getId();
+        if (id == nullptr || *id == 0)
+            continue;
+        moved.emplace_back(id);
+        vis.removeChild(*s);
+    }
+    for (const ChartString& id : moved)
+        vis.addUserSource().setId(id);
+
+    data_ = compressDocument(dataDocument);
+    releaseDocument(dataDocument);
+}
+
+std::string ChartTransformer::getXML(const XMLCh*) {
+    return visualization_ ? visualization_->AsUTF8() : std::string();
+}
+
+std::string ChartTransformer::getEntireXML(const XMLCh* encoding) {
+    if (!visualization_)
+        return {};
+    try {
+        if (visualization_->getUserSources().empty())
+            return visualization_->AsUTF8();
+        DOMDocument* dataDocument = getDataDocument();
+        if (dataDocument == nullptr)
+            return visualization_->AsUTF8();
+        const DOMElement* dataRoot = dataDocument->getDocumentElement();
+
+        DOMDocument* whole = createGrxDocument(encoding != nullptr && *encoding != 0 ? encoding : kUtf8);
+        if (whole == nullptr || whole->getDocumentElement() == nullptr) {
+            releaseDocument(whole);
+            report("getEntireXML fatal error", 427);
+            return {};
+        }
+        // The temporary visualization releases the document whatever happens below.
+        DOMElement* wholeRoot = whole->getDocumentElement();
+        GrxVisualization merged(wholeRoot, true);
+        const DOMElement* chartRoot = visualization_->getImplementation();
+        mergeAttributes(chartRoot, wholeRoot);
+        for (const DOMNode* child = chartRoot->getFirstChild(); child != nullptr;
+             child = child->getNextSibling()) {
+            const DOMNode* take = child;
+            if (child->getNodeType() == DOMNode::ELEMENT_NODE &&
+                sameText(static_cast<const DOMElement*>(child)->getLocalName(),
+                         GrxUserSource::getElementName())) {
+                const XMLCh* id = static_cast<const DOMElement*>(child)->getAttribute(GrxUni::_id);
+                take = nullptr;
+                for (const DOMElement* s = dataRoot->getFirstElementChild(); s != nullptr;
+                     s = s->getNextElementSibling()) {
+                    if (sameText(s->getAttribute(GrxUni::_id), id)) {
+                        take = s;
+                        break;
+                    }
+                }
+                if (take == nullptr)
+                    continue;
+            }
+            DOMNode* imported = wholeRoot->appendChild(whole->importNode(take, true));
+            if (take != child) // a source carries no namespace declaration of its own here
+                static_cast<DOMElement*>(imported)->removeAttributeNS(XMLUni::fgXMLNSURIName,
+                                                                      XMLUni::fgXMLNSString);
+        }
+        merged.wrap(wholeRoot);
+        return merged.AsUTF8();
+    } catch (...) {
+        report("getEntireXML fatal error", 427);
+        return {};
+    }
+}
+
+std::string ChartTransformer::getCompressedXML() {
+    return compressDocument(visualization_ ? visualization_->getDOMDocument() : nullptr);
+}
+
+std::string ChartTransformer::getCompressedData() {
+    if (const DOMDocument* dataDocument = getDataDocument())
+        data_ = compressDocument(dataDocument);
+    return data_;
+}
+
+unsigned char* ChartTransformer::getCompressedDataStream(unsigned int& length) {
+    length = 0;
+    try {
+        if (dataStream_ != nullptr && dataStreamLength_ != 0) {
+            unsigned char* copy = new unsigned char[dataStreamLength_];
+            std::memcpy(copy, dataStream_, dataStreamLength_);
+            length = dataStreamLength_;
+            return copy;
+        }
+        if (data_.empty())
+            return nullptr;
+        XmlDataHandler handler(data_);
+        unsigned char* stream = handler.GetDataStream(length);
+        if (stream == nullptr)
+            length = 0;
+        return stream;
+    } catch (...) {
+        length = 0;
+        report("getCompressedDataStream fatal error", 500);
+        return nullptr;
+    }
+}
+
+bool ChartTransformer::applyTemplate(const std::string& templateText) {
+    if (!visualization_)
+        return false;
+    const bool dump = dumpsWanted();
+    if (dump && willPrintString(PRINT_XML_BEFORE_TEMPLATE)) {
+        printString(getEntireXML(kUtf8), "Xml_before_template_", ".xml", templateDumpCount,
+                    PRINT_XML_BEFORE_TEMPLATE);
+        printString(templateText, "Template_", ".sgt", templateDumpCount, PRINT_TEMPLATE);
+    }
+    bool applied = true;
+    try {
+        ChartTemplate chartTemplate(*visualization_, nullptr);
+        // A template that cannot be read changes nothing, which the host must not take for success.
+        if (chartTemplate.setTemplate(templateText))
+            chartTemplate.applyTemplate();
+        else
+            applied = false;
+    } catch (...) {
+        applied = false;
+    }
+    if (dump && willPrintString(PRINT_XML_AFTER_TEMPLATE)) {
+        printString(getEntireXML(kUtf8), "Xml_after_template_", ".xml", templateDumpCount,
+                    PRINT_XML_AFTER_TEMPLATE);
+        ++templateDumpCount;
+    }
+    return applied;
+}
+
+unsigned int ChartTransformer::addPopups() {
+    if (!visualization_ || !visualization_->getPopups().empty())
+        return 0;
+    applyTemplate(kPopupTemplate);
+    if (dumpsWanted() && willPrintString(PRINT_XML_WITH_POPUPS)) {
+        printString(getEntireXML(kUtf8), "xml_with_popups", ".xml", popupDumpCount, PRINT_XML_WITH_POPUPS);
+        ++popupDumpCount;
+    }
+    return 1;
+}
+
+std::string ChartTransformer::compressDocument(const DOMDocument* document) {
+    try {
+        std::ostringstream text;
+        if (document != nullptr) {
+            ChartPrinter printer;
+            printer.setPrintWhiteSpace(false);
+            printer.Print(document, text);
+        }
+        std::string printed = text.str();
+        if (document != nullptr && isDataRoot(document->getDocumentElement()))
+            dropRepeatedNamespace(printed);
+        std::string compressed;
+        zpack::compressString(printed, compressed);
+        return compressed;
+    } catch (...) {
+        report("compressDocument fatal error", 552);
+        return {};
+    }
+}
+
+DOMDocument* ChartTransformer::createDataDocument(const XMLCh* encoding) {
+    DOMDocument* document = nullptr;
+    try {
+        DOMImplementation* impl = DOMImplementationRegistry::getDOMImplementation(_implFeatures);
+        if (impl == nullptr)
+            return nullptr;
+        document = impl->createDocument(_schemaDatabLocationValue, _gsgraphSources, nullptr);
+        document->setStrictErrorChecking(true);
+        document->setXmlStandalone(false);
+        document->setXmlVersion(_XMLversion);
+        (void)encoding; // the DOM keeps no settable encoding; the printer writes UTF-8
+        DOMElement* root = document->getDocumentElement();
+        root->setAttributeNS(xercesc::XMLUni::fgXMLNSURIName, _schemaDefaultNSName, _schemaDefaultNSValue);
+        root->setAttributeNS(xercesc::XMLUni::fgXMLNSURIName, _schemaInstanceName, _schemaInstanceValue);
+        root->setAttributeNS(xercesc::XMLUni::fgXMLNSURIName, _schemaDataLocationName,
+                             _schemaDatabLocationValue);
+        root->setAttributeNS(_schemaInstanceValue, _schemaLocationName, _schemaDataLocationValue);
+    } catch (...) {
+        report("createDataDocument fatal error", 330);
+    }
+    return document;
+}
+
+DOMDocument* ChartTransformer::getDataDocument() {
+    DOMDocument* document = nullptr;
+    int line = 452;
+    try {
+        if (!data_.empty()) {
+            std::string text;
+            if (!zpack::decompressString(text, data_))
+                return nullptr;
+            document = parseDocument(text);
+        } else if (dataStream_ != nullptr && dataStreamLength_ != 0) {
+            line = 471;
+            std::string text;
+            XmlDataHandler handler(dataStream_, dataStreamLength_);
+            if (!handler.GetXmlData(text, false))
+                return nullptr;
+            document = parseDocument(text);
+        }
+    } catch (...) {
+        report("getDataDocument fatal error", line);
+        return nullptr;
+    }
+    if (document == nullptr)
+        return nullptr;
+    const DOMElement* root = document->getDocumentElement();
+    if (!isDataRoot(root)) {
+        report("getDataDocument: the data is not a data document", line);
+        return nullptr;
+    }
+    std::string bad;
+    if (!allSourceIdsAreNames(root, bad)) {
+        report("getDataDocument: data source name is not an XML name: " + bad, line);
+        return nullptr;
+    }
+    return document;
+}
