@@ -14,8 +14,12 @@ namespace {
 
 constexpr const char* kName = "chart";
 
-// CHART's path without its extension, so outputs land beside it.
+// A path without its extension (and without ".chart" before it), so outputs land beside it.
 std::string stemOf(const std::string& path) {
+    const std::string chartSuffix = ".chart.xml";
+    if (path.size() > chartSuffix.size() &&
+        path.compare(path.size() - chartSuffix.size(), chartSuffix.size(), chartSuffix) == 0)
+        return path.substr(0, path.size() - chartSuffix.size());
     const std::size_t slash = path.find_last_of('/');
     const std::size_t dot = path.find_last_of('.');
     if (dot == std::string::npos || (slash != std::string::npos && dot < slash))
