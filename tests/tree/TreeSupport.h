@@ -1,0 +1,96 @@
+#ifndef PLOTAID_TESTS_TREE_TREESUPPORT_H
+#define PLOTAID_TESTS_TREE_TREESUPPORT_H
+
+#include "foundation/ValidatingParser.h"
+#include "support/TestSupport.h"
+
+#include <plotaid/TreeTransformer.h>
+
+#include <grx/ChartString.h>
+
+#include <xercesc/dom/DOM.hpp>
+
+#include <string>
+#include <vector>
+
+// Opens the protected operations for the tests.
+class TestTree : public TreeTransformer {
+public:
+    using TreeTransformer::compressDocument;
+    using TreeTransformer::createPMMLDocument;
+    using TreeTransformer::displayDocument;
+    using TreeTransformer::GetNewPredictorItem;
+    using TreeTransformer::GetStatFormatElement;
+    using TreeTransformer::mergeDOM;
+    using TreeTransformer::SetupDisplayData;
+    using TreeTransformer::setupPMMLDOM;
+    using TreeTransformer::TreeTransformer;
+    XERCES_CPP_NAMESPACE::DOMDocument* pmmlDocument() const { return document_; }
+};
+
+inline std::string example(const std::string& name) {
+    return readAll(std::string(PLOTAID_EXAMPLES_DIR) + "/pmml/" + name);
+}
+
+inline std::string u8(const XMLCh* text) {
+    return text ? ChartString(text).toUTF8() : std::string("<null>");
+}
+
+// Elements of the local name anywhere below (and including) the node, in document order.
+inline std::vector<XERCES_CPP_NAMESPACE::DOMElement*> elements(const XERCES_CPP_NAMESPACE::DOMNode* node,
+                                                               const char* name) {
+    std::vector<XERCES_CPP_NAMESPACE::DOMElement*> found;
+    if (node == nullptr)
+        return found;
+    for (auto* child = node->getFirstChild(); child; child = child->getNextSibling()) {
+        if (child->getNodeType() != XERCES_CPP_NAMESPACE::DOMNode::ELEMENT_NODE)
+            continue;
+        auto* element = static_cast<XERCES_CPP_NAMESPACE::DOMElement*>(child);
+        if (u8(element->getLocalName()) == name)
+            found.push_back(element);
+        for (auto* below : elements(element, name))
+            found.push_back(below);
+    }
+    return found;
+}
+
+inline std::string attr(const XERCES_CPP_NAMESPACE::DOMElement* element, const char* name) {
+    if (element == nullptr)
+        return "<no element>";
+    const std::u16string key(name, name + std::char_traits<char>::length(name));
+    if (!element->hasAttribute(key.c_str()))
+        return "<absent>";
+    return u8(element->getAttribute(key.c_str()));
+}
+
+// Texts the library wrote, read back with validation against their grammars.
+class Reader {
+public:
+    XERCES_CPP_NAMESPACE::DOMDocument* read(const std::string& text) {
+        return parser_.parse(text, "test", ChartException("test parse", "test", 1));
+    }
+    const std::vector<std::string>& errors() const { return parser_.lastErrors(); }
+
+private:
+    plotaid::detail::ValidatingParser parser_;
+};
+
+// The second, independent validator; skipped when the machine has none.
+inline bool haveXmllint() {
+    return std::system("xmllint --version >/dev/null 2>&1") == 0;
+}
+inline int xmllint(const std::string& file, const std::string& schema) {
+    const std::string command = "xmllint --noout --schema '" + std::string(PLOTAID_SOURCE_DIR) +
+                                "/resources/schemas/" + schema + "' '" + file + "' >/dev/null 2>&1";
+    return std::system(command.c_str());
+}
+
+// The error log's records, counted.
+inline int records(const std::string& log) {
+    int count = 0;
+    for (std::size_t at = log.find(" -- "); at != std::string::npos; at = log.find(" -- ", at + 1))
+        ++count;
+    return count;
+}
+
+#endif
