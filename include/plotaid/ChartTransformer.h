@@ -8,9 +8,11 @@
 
 #include <memory>
 #include <string>
+#include <vector>
 
 XERCES_CPP_NAMESPACE_BEGIN
 class DOMDocument;
+class DOMElement;
 XERCES_CPP_NAMESPACE_END
 
 class GrxVisualization;
@@ -63,8 +65,19 @@ protected:
 private:
     bool buildVisualization(const std::string& text);
     void moveSourcesToData();
+    // The data document and the compressed data of the chart's own sources, made on first demand.
+    const XERCES_CPP_NAMESPACE::DOMDocument* madeDataDocument();
+    const std::string& compressedData();
+
+    struct DocumentRelease {
+        void operator()(XERCES_CPP_NAMESPACE::DOMDocument* document) const;
+    };
 
     std::unique_ptr<GrxVisualization> visualization_;
+    // The sources taken from the chart (nodes of its document, out of its tree), so that the whole
+    // document is put together without compressing, decompressing and parsing the data again.
+    std::vector<XERCES_CPP_NAMESPACE::DOMElement*> sources_;
+    std::unique_ptr<XERCES_CPP_NAMESPACE::DOMDocument, DocumentRelease> madeData_;
     std::string data_;
     const unsigned char* dataStream_ = nullptr;
     unsigned int dataStreamLength_ = 0;

@@ -116,6 +116,8 @@ ChartTransformer::ChartTransformer(const std::string& xml) {
     } catch (...) {
         visualization_.reset();
         data_.clear();
+        madeData_.reset();
+        sources_.clear();
         report("ChartTransformer ctor fatal error", 120);
     }
 }
@@ -176,46 +178,110 @@ bool ChartTransformer::buildVisualization(const std::string& text) {
 
 void ChartTransformer::moveSourcesToData() {
     GrxVisualization& vis = *visualization_;
-    std::vector<GrxBaseElement*> sources;
+    // Copies of the sources that stay, in the order the data document lists them; the embedded ones
+    // themselves follow once they leave the chart. All remain nodes of the chart's document.
     for (GrxBaseElement* s : vis.getUserSources())
-        sources.push_back(s);
+        sources_.push_back(static_cast<DOMElement*>(s->getImplementation()->cloneNode(true)));
     for (GrxBaseElement* s : vis.getDatabaseSources())
-        sources.push_back(s);
+        sources_.push_back(static_cast<DOMElement*>(s->getImplementation()->cloneNode(true)));
     for (GrxBaseElement* s : vis.getDelimitedFileSources())
-        sources.push_back(s);
+        sources_.push_back(static_cast<DOMElement*>(s->getImplementation()->cloneNode(true)));
     for (GrxBaseElement* s : vis.getStreamingSources())
-        sources.push_back(s);
-    const std::vector<GrxEmbeddedSource*> embedded = vis.getEmbeddedSources();
-    for (GrxBaseElement* s : embedded)
-        sources.push_back(s);
-    if (sources.empty())
-        return;
-
-    DOMDocument* dataDocument = createDataDocument(kUtf8);
-    if (dataDocument == nullptr || dataDocument->getDocumentElement() == nullptr) {
-        releaseDocument(dataDocument);
-        report("ChartTransformer: no data document could be made", 180);
-        return;
-    }
-    DOMElement* dataRoot = dataDocument->getDocumentElement();
-    for (GrxBaseElement* s : sources)
-        dataRoot->appendChild(dataDocument->importNode(s->getImplementation(), true));
+        sources_.push_back(static_cast<DOMElement*>(s->getImplementation()->cloneNode(true)));
 
     // An embedded source without an id could never be found again, so it stays in the chart.
     std::vector<ChartString> moved;
-    for (GrxEmbeddedSource* s : embedded) {
+    for (GrxEmbeddedSource* s : vis.getEmbeddedSources()) {
         const XMLCh* id = s->getId();
         if (id == nullptr || *id == 0)
             continue;
         moved.emplace_back(id);
+        sources_.push_back(s->getImplementation());
         vis.removeChild(*s);
     }
     for (const ChartString& id : moved)
         vis.addUserSource().setId(id);
-
-    data_ = compressDocument(dataDocument);
-    releaseDocument(dataDocument);
 }
+
+const DOMDocument* ChartTransformer::madeDataDocument() {
+    if (madeData_ || sources_.empty())
+        return madeData_.get();
+    std::unique_ptr<DOMDocument, DocumentRelease> made(createDataDocument(kUtf8));
+    if (!made || made->getDocumentElement() == nullptr) {
+        report("ChartTransformer: no data document could be made", 180);
+        return nullptr;
+    }
+    DOMElement* root = made->getDocumentElement();
+    for (const DOMElement* source : sources_)
+        root->appendChild(made->importNode(source, true));
+    madeData_ = std::move(made);
+    return madeData_.get();
+}
+
+void ChartTransformer::DocumentRelease::operator()(DOMDocument* document) const {
+    ChartBase::releaseDocument(document);
+}
+
+const std::string& ChartTransformer::compressedData() {
+    if (data_.empty() && !sources_.empty())
+        if (const DOMDocument* made = madeDataDocument())
+            data_ = compressDocument(made);
+    return data_;
+}
+
+namespace {
+
+// Puts sources in place of their references for as long as it lives (the whole document is the
+// chart's own document, printed in between), and the references back whatever happens.
+class SourcesInPlace {
+public:
+    SourcesInPlace(DOMElement* chartRoot, const std::vector<DOMElement*>& sources) {
+        for (DOMNode* child = chartRoot->getFirstChild(); child != nullptr; child = child->getNextSibling()) {
+            if (child->getNodeType() != DOMNode::ELEMENT_NODE ||
+                !sameText(static_cast<DOMElement*>(child)->getLocalName(), GrxUserSource::getElementName()))
+                continue;
+            const XMLCh* id = static_cast<DOMElement*>(child)->getAttribute(GrxUni::_id);
+            DOMNode* put = nullptr;
+            for (DOMElement* s : sources)
+                if (sameText(s->getAttribute(GrxUni::_id), id)) {
+                    put = s;
+                    break;
+                }
+            // A reference without a source is left out: an empty text stands in its place.
+            if (put == nullptr) {
+                put = chartRoot->getOwnerDocument()->createTextNode(u"");
+                placeholders_.push_back(put);
+            }
+            swaps_.push_back({child, put});
+        }
+        for (Swap& swap : swaps_)
+            chartRoot->replaceChild(swap.put, swap.reference);
+        root_ = chartRoot;
+    }
+    ~SourcesInPlace() {
+        try {
+            for (Swap& swap : swaps_)
+                if (swap.put->getParentNode() == root_)
+                    root_->replaceChild(swap.reference, swap.put);
+            for (DOMNode* p : placeholders_)
+                p->release();
+        } catch (...) {
+        }
+    }
+    SourcesInPlace(const SourcesInPlace&) = delete;
+    SourcesInPlace& operator=(const SourcesInPlace&) = delete;
+
+private:
+    struct Swap {
+        DOMNode* reference;
+        DOMNode* put;
+    };
+    DOMElement* root_ = nullptr;
+    std::vector<Swap> swaps_;
+    std::vector<DOMNode*> placeholders_;
+};
+
+} // namespace
 
 std::string ChartTransformer::getXML(const XMLCh*) {
     return visualization_ ? visualization_->AsUTF8() : std::string();
@@ -227,6 +293,14 @@ std::string ChartTransformer::getEntireXML(const XMLCh* encoding) {
     try {
         if (visualization_->getUserSources().empty())
             return visualization_->AsUTF8();
+        DOMElement* chartRoot = visualization_->getImplementation();
+        // The chart's own sources go back into its document without copying them, as long as the
+        // chart's root declares what a new whole document's root would.
+        if (!sources_.empty() && chartRoot->hasAttribute(_schemaInstanceName) &&
+            chartRoot->hasAttribute(_schemaLocationName) && chartRoot->hasAttribute(_schemaDefaultNSName)) {
+            SourcesInPlace inPlace(chartRoot, sources_);
+            return visualization_->AsUTF8();
+        }
         DOMDocument* dataDocument = getDataDocument();
         if (dataDocument == nullptr)
             return visualization_->AsUTF8();
@@ -241,7 +315,6 @@ std::string ChartTransformer::getEntireXML(const XMLCh* encoding) {
         // The temporary visualization releases the document whatever happens below.
         DOMElement* wholeRoot = whole->getDocumentElement();
         GrxVisualization merged(wholeRoot, true);
-        const DOMElement* chartRoot = visualization_->getImplementation();
         mergeAttributes(chartRoot, wholeRoot);
         for (const DOMNode* child = chartRoot->getFirstChild(); child != nullptr;
              child = child->getNextSibling()) {
@@ -279,6 +352,8 @@ std::string ChartTransformer::getCompressedXML() {
 }
 
 std::string ChartTransformer::getCompressedData() {
+    if (!sources_.empty())
+        return compressedData();
     if (const DOMDocument* dataDocument = getDataDocument())
         data_ = compressDocument(dataDocument);
     return data_;
@@ -293,7 +368,7 @@ unsigned char* ChartTransformer::getCompressedDataStream(unsigned int& length) {
             length = dataStreamLength_;
             return copy;
         }
-        if (data_.empty())
+        if (compressedData().empty())
             return nullptr;
         XmlDataHandler handler(data_);
         unsigned char* stream = handler.GetDataStream(length);
@@ -391,6 +466,8 @@ DOMDocument* ChartTransformer::createDataDocument(const XMLCh* encoding) {
 
 DOMDocument* ChartTransformer::getDataDocument() {
     DOMDocument* document = nullptr;
+    if (!sources_.empty())
+        return const_cast<DOMDocument*>(madeDataDocument());
     int line = 452;
     try {
         if (!data_.empty()) {

@@ -309,3 +309,19 @@ TEST_F(TransformerTest, TemplateDumpsShareOneCounter) {
     ASSERT_TRUE(before.ok());
     EXPECT_FALSE(before.idsOf(u"embeddedSource").empty());
 }
+
+TEST_F(TransformerTest, EntireDocumentLeavesTheChartAsItWas) {
+    ChartTransformer t(example("charts/area.xml"));
+    ASSERT_NE(t.getVisualization(), nullptr);
+    // A reference that no source answers, made after the data was taken.
+    t.getVisualization()->addUserSource().setId(ChartString("late"));
+    const std::string before = t.getXML();
+    Parsed entire(t.getEntireXML(u"UTF-8"));
+    ASSERT_TRUE(entire.ok());
+    EXPECT_TRUE(entire.idsOf(u"userSource").empty());
+    EXPECT_EQ(entire.idsOf(u"embeddedSource"), std::vector<std::string>{"rain"});
+    EXPECT_EQ(t.getXML(), before);
+    // The sources are found again the next time.
+    EXPECT_EQ(t.getEntireXML(u"UTF-8"), entire.vis->AsUTF8());
+    EXPECT_NE(t.getVisualization()->getElementById(u"late"), nullptr);
+}
