@@ -19,6 +19,7 @@
 #include <xercesc/util/XMLChar.hpp>
 #include <xercesc/util/XMLString.hpp>
 
+#include <algorithm>
 #include <cstdlib>
 #include <cstring>
 #include <sstream>
@@ -236,6 +237,7 @@ namespace {
 class SourcesInPlace {
 public:
     SourcesInPlace(DOMElement* chartRoot, const std::vector<DOMElement*>& sources) {
+        std::vector<DOMNode*> used;
         for (DOMNode* child = chartRoot->getFirstChild(); child != nullptr; child = child->getNextSibling()) {
             if (child->getNodeType() != DOMNode::ELEMENT_NODE ||
                 !sameText(static_cast<DOMElement*>(child)->getLocalName(), GrxUserSource::getElementName()))
@@ -247,10 +249,16 @@ public:
                     put = s;
                     break;
                 }
-            // A reference without a source is left out: an empty text stands in its place.
+            // A reference without a source is left out: an empty text stands in its place. A source
+            // asked for twice is copied, so that each reference has a node of its own to swap back.
             if (put == nullptr) {
                 put = chartRoot->getOwnerDocument()->createTextNode(u"");
                 placeholders_.push_back(put);
+            } else if (std::find(used.begin(), used.end(), put) != used.end()) {
+                put = put->cloneNode(true);
+                placeholders_.push_back(put);
+            } else {
+                used.push_back(put);
             }
             swaps_.push_back({child, put});
         }

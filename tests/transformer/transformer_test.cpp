@@ -325,3 +325,23 @@ TEST_F(TransformerTest, EntireDocumentLeavesTheChartAsItWas) {
     EXPECT_EQ(t.getEntireXML(u"UTF-8"), entire.vis->AsUTF8());
     EXPECT_NE(t.getVisualization()->getElementById(u"late"), nullptr);
 }
+
+TEST_F(TransformerTest, SourceAskedForTwiceComesBackTwiceAndTheReferencesStay) {
+    ChartTransformer t(example("charts/area.xml"));
+    ASSERT_NE(t.getVisualization(), nullptr);
+    t.getVisualization()->addUserSource().SetAttribute(u"id", u"rain");
+    t.getEntireXML(u"UTF-8");
+    // Both references are still in the chart afterwards, whatever the duplicate id does to validity.
+    const std::string text = t.getXML();
+    std::size_t count = 0;
+    for (std::size_t at = text.find("<userSource"); at != std::string::npos;
+         at = text.find("<userSource", at + 1))
+        ++count;
+    EXPECT_EQ(count, 2u);
+    const std::string whole = t.getEntireXML(u"UTF-8");
+    std::size_t sources = 0;
+    for (std::size_t at = whole.find("<embeddedSource"); at != std::string::npos;
+         at = whole.find("<embeddedSource", at + 1))
+        ++sources;
+    EXPECT_EQ(sources, 2u);
+}
