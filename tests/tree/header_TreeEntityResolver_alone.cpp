@@ -1,0 +1,2 @@
+// Compiles only if <plotaid/TreeEntityResolver.h> brings everything it needs.
+#include <plotaid/TreeEntityResolver.h>

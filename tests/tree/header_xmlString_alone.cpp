@@ -1,0 +1,2 @@
+// Compiles only if <plotaid/xmlString.h> brings everything it needs.
+#include <plotaid/xmlString.h>
