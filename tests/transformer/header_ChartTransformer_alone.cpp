@@ -1,0 +1,2 @@
+// Compiles only if <plotaid/ChartTransformer.h> brings everything it needs.
+#include <plotaid/ChartTransformer.h>
