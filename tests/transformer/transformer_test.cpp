@@ -8,6 +8,7 @@
 #include <cstring>
 #include <filesystem>
 #include <memory>
+#include <type_traits>
 
 using namespace transformer_test;
 
@@ -345,3 +346,7 @@ TEST_F(TransformerTest, SourceAskedForTwiceComesBackTwiceAndTheReferencesStay) {
         ++sources;
     EXPECT_EQ(sources, 2u);
 }
+
+// A transformer owns its visualization: no copy may share it.
+static_assert(!std::is_copy_constructible_v<ChartTransformer>);
+static_assert(!std::is_copy_assignable_v<ChartTransformer>);
