@@ -55,6 +55,7 @@ TEST(TreeTool, RefusesBadInput) {
     EXPECT_EQ(runTool("tree --pmml " + pmmlPath("credit-risk.xml") + " --zoom 501").exitCode, 2);
     EXPECT_EQ(runTool("tree --pmml " + pmmlPath("credit-risk.xml") + " --orientation sideways").exitCode, 2);
     EXPECT_EQ(runTool("tree --pmml " + pmmlPath("credit-risk.xml") + " --bogus x").exitCode, 2);
+    EXPECT_EQ(runTool("tree --pmml " + pmmlPath("credit-risk.xml") + " --pmml-out -").exitCode, 2);
     const ToolResult model =
         runTool("tree --pmml '" + dir.file("bad.xml") + "' --pmml-out '" + dir.file("o.xml") + "'");
     EXPECT_EQ(model.exitCode, 1) << model.output;

@@ -127,6 +127,8 @@ std::string parse(const Args& args, Options& o) {
     }
     if (o.pmml.empty())
         return "no PMML file (--pmml FILE)";
+    if (o.pmmlOut == "-" || o.compressedOut == "-")
+        return "the display settings go to standard output; name a file for the model";
     return std::string();
 }
 
