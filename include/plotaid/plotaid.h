@@ -15,11 +15,8 @@
 #include <plotaid/TimeStamp.h>
 #include <plotaid/TreeEntityResolver.h>
 #include <plotaid/TreeTransformer.h>
-#include <plotaid/TreeEntityResolver.h>
-#include <plotaid/TreeTransformer.h>
 #include <plotaid/VarDataProcessor.h>
 #include <plotaid/XmlDataHandler.h>
-#include <plotaid/xmlString.h>
 #include <plotaid/xmlString.h>
 
 #endif
