@@ -102,3 +102,28 @@ TEST_F(ToolValidate, UsageAndMissingFiles) {
 }
 
 } // namespace
+
+TEST(ToolValidateTree, TreeModelsAndDisplaySettingsAreKnownKinds) {
+    const std::string pmml = std::string(PLOTAID_EXAMPLES_DIR) + "/pmml/credit-risk.xml";
+    const std::string settings = ::testing::TempDir() + "tree-settings.xml";
+    ASSERT_EQ(runTool("tree --pmml '" + pmml + "' > '" + settings + "'").exitCode, 0);
+    const ToolResult good = runTool("validate '" + pmml + "' '" + settings + "'");
+    EXPECT_EQ(good.exitCode, 0) << good.output;
+    EXPECT_NE(good.output.find(pmml + ": valid (tree model, pmml-2-1.xsd)"), std::string::npos)
+        << good.output;
+    EXPECT_NE(good.output.find(settings + ": valid (tree display settings document, treeview-1.0.xsd)"),
+              std::string::npos)
+        << good.output;
+
+    // A tree model is validated, not only recognised.
+    std::ifstream in(pmml, std::ios::binary);
+    std::string text((std::istreambuf_iterator<char>(in)), std::istreambuf_iterator<char>());
+    const std::string::size_type at = text.find("<Header ");
+    ASSERT_NE(at, std::string::npos);
+    text.insert(at, "<Bogus/>");
+    const std::string broken = ::testing::TempDir() + "broken-tree.xml";
+    std::ofstream(broken, std::ios::binary) << text;
+    const ToolResult bad = runTool("validate '" + broken + "'");
+    EXPECT_EQ(bad.exitCode, 1) << bad.output;
+    EXPECT_NE(bad.output.find("Bogus"), std::string::npos) << bad.output;
+}

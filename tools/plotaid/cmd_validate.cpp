@@ -22,10 +22,10 @@ namespace {
 using namespace XERCES_CPP_NAMESPACE;
 
 constexpr const char* kName = "validate";
-// Larger inputs are refused before they are read into memory.
-
 constexpr const char* kChartNamespace = "http://plotaid.org/grxml";
 constexpr const char* kDataNamespace = "http://plotaid.org/grxml/data";
+constexpr const char* kTreeViewNamespace = "http://plotaid.org/treeview/1.0";
+constexpr const char* kPmmlNamespace = "http://www.dmg.org/PMML-2_1";
 constexpr const char* kSchemaInstance = "http://www.w3.org/2001/XMLSchema-instance";
 
 // What a document is, told by its root element and namespace, and the grammars it may name.
@@ -43,6 +43,8 @@ const std::vector<Kind>& kinds() {
         {"graph", kChartNamespace, "older chart", "an", {"grxml-1.4.xsd"}},
         {"template", kChartNamespace, "template", "a", {"grxml-template-3.5.xsd", "grxml-template-1.0.xsd"}},
         {"graphSources", kDataNamespace, "data document", "a", {"grxml-data-2.1.xsd"}},
+        {"displaySettings", kTreeViewNamespace, "tree display settings document", "a", {"treeview-1.0.xsd"}},
+        {"PMML", kPmmlNamespace, "tree model", "a", {"pmml-2-1.xsd"}},
     };
     return all;
 }
@@ -91,7 +93,8 @@ std::string checkKind(const DOMDocument& document, std::string& what) {
                kind.schemas.front() +
                (file.empty() ? std::string(" (it names none)") : " (it names " + file + ")");
     }
-    return "root element '" + local + "' in namespace '" + ns + "' is not a chart, template or data document";
+    return "root element '" + local + "' in namespace '" + ns +
+           "' is not a chart, template, data document, tree display settings or tree model";
 }
 
 // The library's parser lets a repeated id pass (Xerces-C reports it as a wrong data-type value);
@@ -174,7 +177,9 @@ int run(const Args& args) {
             "  visualization (http://plotaid.org/grxml)      chart, grxml-2.9.xsd\n"
             "  graph (http://plotaid.org/grxml)              older chart or template, grxml-1.4.xsd\n"
             "  template (http://plotaid.org/grxml)           template, grxml-template-3.5.xsd or -1.0.xsd\n"
-            "  graphSources (http://plotaid.org/grxml/data)  data document, grxml-data-2.1.xsd\n\n"
+            "  graphSources (http://plotaid.org/grxml/data)  data document, grxml-data-2.1.xsd\n"
+            "  displaySettings (http://plotaid.org/treeview/1.0)  tree display settings, treeview-1.0.xsd\n"
+            "  PMML (http://www.dmg.org/PMML-2_1)            tree model, pmml-2-1.xsd\n\n"
             "An id used twice is reported although the library reads such a document.\n"
             "Prints one line per file, \"FILE: valid (...)\" or \"FILE: error\" for each error.\n"
             "Exit status: 0 when every file is valid, 1 when any is not, 2 on a usage error.\n");
