@@ -169,8 +169,9 @@ int run(const Args& args) {
     if (wantsHelp(args)) {
         std::printf(
             "usage: plotaid validate FILE...\n\n"
-            "Validates each chart, template or data document against its grammar, with the\n"
-            "library's parser settings: schemas are read from the resource folder\n"
+            "Validates each chart, template, data document, tree display settings document or\n"
+            "PMML tree model against its grammar, with the library's parser settings: schemas\n"
+            "are read from the resource folder\n"
             "(PLOTAID_RESOURCE_DIR overrides it), and values of a wrong data type pass, as they\n"
             "do when the library reads a document. The kind of document is told by its root\n"
             "element and namespace:\n"
