@@ -22,9 +22,13 @@ class GrrUviza;
 class GrxAxis;
 class GrxBaseElement;
 class GrxDimension;
+class GrxFormat;
 class GrxInterval;
+class GrxLabeling;
 class GrxLegend;
 class GrxStyle;
+class GrxStyleBy;
+class GrxStyleCycle;
 class GrxVisualization;
 
 // Base of every template action: what an action works on (the target visualization, the chart's
@@ -81,6 +85,38 @@ public:
     bool doesCoordinateMatch(const CTElementType& element, const ChartString& number) const;
     // Whether the nearest coordinates at or above the element are the first, or the second for "y2".
     bool doesCoordinateMatch(const GrxBaseElement& element, const ChartString& name) const;
+
+    // Merges a template "style" element into `style`, property by property; what the chart's own
+    // definition (the source) sets on the style of the same id is never overwritten.
+    void importStyle(const XERCES_CPP_NAMESPACE::DOMElement* element, GrxStyle& style);
+
+    // Template format elements onto an object-model format; a null element does nothing.
+    // "format" is a literal copy; the others only add to what the format already says.
+    static void importFormat(GrxFormat& format, const XERCES_CPP_NAMESPACE::DOMElement* element);
+    void importNumberFormat(GrxFormat& format, const XERCES_CPP_NAMESPACE::DOMElement* element);
+    void importStringFormat(GrxFormat& format, const XERCES_CPP_NAMESPACE::DOMElement* element);
+    void importDateTimeFormat(GrxFormat& format, const XERCES_CPP_NAMESPACE::DOMElement* element);
+    void importElapsedTimeFormat(GrxFormat& format, const XERCES_CPP_NAMESPACE::DOMElement* element);
+
+    // Cloning one object of the target into another: every copied aesthetic gets a fresh id.
+    // Every attribute but the id; returns how many were copied.
+    std::uint32_t duplicateAttributes(const GrxBaseElement& from, GrxBaseElement& to);
+    // Variables, aesthetics and conditional styles.
+    bool cloneElementChildren(const CTElementType& from, CTElementType& to, bool cloneLegend);
+    // From and to are elements or labelings; anything else is left alone. Always false.
+    bool cloneElementAesthetics(const GrxBaseElement& from, GrxBaseElement& to, bool cloneLegend);
+    void cloneStyleBy(const GrxStyleBy& from, GrxStyleBy& to);
+    void cloneStyleCycle(const GrxStyleCycle& from, GrxStyleCycle& to);
+    // A style-by on `to` like the first of `from`, whose cycle keeps only the colours (swapped
+    // from a point onto a line or a text).
+    void cloneStyleCycle(CTElementType& to, const CTElementType& from, const XMLCh* prefix,
+                         const ChartString& fromKind, const ChartString& toKind);
+    bool cloneConditionalStyles(const CTElementType& from, CTElementType& to);
+    // Every legend that shows the aesthetic `oldId` shows `aesthetic` too.
+    void CloneLegendEntry(const ChartString& oldId, GrxBaseElement& aesthetic);
+    // Cycle styles without a colour of their own take their colour 2; returns the style-by count.
+    std::uint32_t changeColor2ToColor(CTElementType& element, bool force);
+    std::uint32_t changeColor2ToColor(GrxLabeling& labeling, bool force);
 
     static const XMLCh* const _before;
     static const XMLCh* const _casenum;

@@ -7,6 +7,7 @@
 #include <plotaid/ChartErrorHandler.h>
 #include <plotaid/ChartException.h>
 #include <plotaid/ChartKey.h>
+#include <plotaid/ChartStyleValue.h>
 #include <plotaid/ChartTemplate.h>
 #include <plotaid/ChartTransformer.h>
 #include <plotaid/Kovar_Format.h>

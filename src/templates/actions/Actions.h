@@ -8,6 +8,8 @@
 // makeAction<TClass>, one line per class.
 
 #include "templates/InstructionWalk.h"
+#include "templates/actions/aesthetics.h"
+#include "templates/actions/style.h"
 
 #include <memory>
 #include <type_traits>

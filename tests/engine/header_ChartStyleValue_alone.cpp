@@ -1,0 +1,2 @@
+// Compiles only if <plotaid/ChartStyleValue.h> brings everything it needs.
+#include <plotaid/ChartStyleValue.h>
