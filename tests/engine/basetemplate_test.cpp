@@ -1,4 +1,4 @@
-#include "EngineSupport.h"
+#include "support/EngineSupport.h"
 
 #include <plotaid/BaseTemplate.h>
 

@@ -1,4 +1,4 @@
-#include "EngineSupport.h"
+#include "support/EngineSupport.h"
 
 #include "../foundation/FoundationSupport.h"
 

@@ -1,5 +1,5 @@
-#ifndef PLOTAID_TESTS_ENGINE_SUPPORT_H
-#define PLOTAID_TESTS_ENGINE_SUPPORT_H
+#ifndef PLOTAID_TESTS_SUPPORT_ENGINESUPPORT_H
+#define PLOTAID_TESTS_SUPPORT_ENGINESUPPORT_H
 
 #include "foundation/RecordSink.h"
 #include "foundation/ValidatingParser.h"
