@@ -55,11 +55,15 @@ const DOMElement* firstDescendant(const DOMElement* root, const XMLCh* name) {
 // is left out, since two holders would make every reference to it ambiguous.
 void importKeepingIdsUnique(GrxBaseElement& to, const DOMElement* from) {
     const XMLCh* id = from->getAttribute(GrxUni::_id);
-    const DOMElement* holder = hasText(id) ? to.getElementById(id) : nullptr;
-    const bool taken = holder != nullptr && holder != to.getImplementation();
+    DOMElement* holder = hasText(id) ? to.getElementById(id) : nullptr;
+    if (holder == to.getImplementation())
+        holder = nullptr;
     to.importAttributes(from);
-    if (taken)
-        to.removeAttribute(GrxUni::_id);
+    if (holder == nullptr)
+        return;
+    // Importing declared the id on `to`, taking it from its holder: undo both.
+    to.removeAttribute(GrxUni::_id);
+    holder->setIdAttributeNode(holder->getAttributeNode(GrxUni::_id), true);
 }
 
 void importAffixes(GrxFormat& format, const DOMElement* element) {
