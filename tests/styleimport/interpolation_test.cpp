@@ -1,0 +1,167 @@
+#include "StyleImportSupport.h"
+
+#include <grx/GrxUni.h>
+
+using namespace XERCES_CPP_NAMESPACE;
+using engine_test::Chart;
+using engine_test::EngineTest;
+using styleimport_test::Probe;
+using styleimport_test::utf8;
+
+namespace {
+
+// A graph with two lines (one of style "lineStyle", one of "otherLine"), an area of "areaStyle"
+// and a path without a style; every element has an id.
+Chart linesAreasAndPaths() {
+    Chart chart = Chart::empty();
+    GrxVisualization& vis = *chart.vis;
+    auto style = [&](const char16_t* id) -> GrxStyle& {
+        GrxStyle& s = vis.addStyle();
+        s.setId(id);
+        return s;
+    };
+    GrxStyle& container = style(u"c-o-n-t-a-i-n-er");
+    (void)container;
+    GrrUviza& graph = vis.addGraph();
+    GrxLine& matching = graph.addLine();
+    matching.setId(u"line_a");
+    matching.setStyle(style(u"lineStyle"));
+    GrxLine& other = graph.addLine();
+    other.setId(u"line_b");
+    other.setStyle(style(u"otherLine"));
+    GrxArea& area = graph.addArea();
+    area.setId(u"area_a");
+    area.setStyle(style(u"areaStyle"));
+    graph.addPath().setId(u"path_a");
+    return chart;
+}
+
+class Interpolation : public EngineTest {
+protected:
+    void SetUp() override { chart_ = linesAreasAndPaths(); }
+
+    void import(const char16_t* styleId, const std::string& interpolation, const Chart* source = nullptr) {
+        const DOMElement* e = elements_.make("<style>" + interpolation + "</style>");
+        ASSERT_NE(e, nullptr);
+        GrxStyle* style = chart_.vis->getStyleById(styleId);
+        ASSERT_NE(style, nullptr);
+        Probe(source ? source->vis.get() : nullptr, *chart_.vis, nullptr).importStyle(e, *style);
+    }
+    CTElementType& element(const char16_t* id) {
+        return *GrxBaseElement::wrapperOf<CTElementType>(chart_.vis->getElementById(id));
+    }
+    // The smoothing method of the element's first smooth statistic; -1 when it has none.
+    int method(const char16_t* id) {
+        const std::vector<GrxSmoothStatistic*> smooths = element(id).getSmoothStatistics();
+        return smooths.empty() ? -1 : smooths.front()->getMethod();
+    }
+
+    Chart chart_;
+    styleimport_test::StyleElements elements_;
+};
+
+TEST_F(Interpolation, StepRightSmoothsMatchingLinesAndEveryAreaAndPath) {
+    import(u"lineStyle", R"(<interpolation type="step" pointPosition="right"/>)");
+    EXPECT_EQ(method(u"line_a"), 14);
+    EXPECT_EQ(method(u"line_b"), -1);
+    EXPECT_EQ(method(u"area_a"), 14);
+    EXPECT_EQ(method(u"path_a"), 14);
+    EXPECT_FALSE(element(u"line_a").getShowDiscontinuity());
+    EXPECT_TRUE(element(u"line_a").isShowDiscontinuityPresent());
+    EXPECT_FALSE(element(u"line_b").isShowDiscontinuityPresent());
+}
+
+TEST_F(Interpolation, PositionAndTypeChooseTheMethod) {
+    import(u"lineStyle", R"(<interpolation type="jump" pointPosition="left"/>)");
+    EXPECT_EQ(method(u"line_a"), 13);
+    EXPECT_TRUE(element(u"line_a").getShowDiscontinuity());
+    import(u"lineStyle", R"(<interpolation type="step" pointPosition="center"/>)");
+    EXPECT_EQ(method(u"line_a"), 15);
+    EXPECT_FALSE(element(u"line_a").getShowDiscontinuity());
+    import(u"lineStyle", R"(<interpolation type="step"/>)");
+    EXPECT_EQ(method(u"line_a"), 15);
+    import(u"lineStyle", R"(<interpolation type="straight" pointPosition="left"/>)");
+    EXPECT_EQ(method(u"line_a"), 0);
+    // One smooth statistic, reused each time.
+    EXPECT_EQ(element(u"line_a").getSmoothStatistics().size(), 1u);
+    EXPECT_EQ(element(u"area_a").getSmoothStatistics().size(), 1u);
+}
+
+TEST_F(Interpolation, TheMethodIsWrittenSoItReadsBack) {
+    import(u"lineStyle", R"(<interpolation type="jump" pointPosition="right"/>)");
+    const Chart reread = Chart::parse(chart_.vis->AsUTF8());
+    ASSERT_TRUE(reread.vis);
+    const auto* line = GrxBaseElement::wrapperOf<CTElementType>(reread.vis->getElementById(u"line_a"));
+    ASSERT_NE(line, nullptr);
+    ASSERT_EQ(line->getSmoothStatistics().size(), 1u);
+    EXPECT_EQ(line->getSmoothStatistics().front()->getMethod(), 14);
+    EXPECT_TRUE(line->getShowDiscontinuity());
+}
+
+TEST_F(Interpolation, TheContainerStyleMatchesEveryLine) {
+    import(u"c-o-n-t-a-i-n-er", R"(<interpolation type="step" pointPosition="left"/>)");
+    EXPECT_EQ(method(u"line_a"), 13);
+    EXPECT_EQ(method(u"line_b"), 13);
+}
+
+TEST_F(Interpolation, WithoutATypeNothingIsSmoothedButElementsGetStyles) {
+    import(u"lineStyle", R"(<interpolation pointPosition="left"/>)");
+    for (const char16_t* id : {u"line_a", u"line_b", u"area_a", u"path_a"})
+        EXPECT_EQ(method(id), -1) << utf8(id);
+    // The path had no style; it has one of the template's now, inside the container.
+    GrxStyle* added = element(u"path_a").getStyle();
+    ASSERT_NE(added, nullptr);
+    EXPECT_EQ(utf8(added->getId()), "style1");
+    EXPECT_EQ(added->getImplementation()->getParentNode(),
+              chart_.vis->getStyleById(u"c-o-n-t-a-i-n-er")->getImplementation());
+    import(u"lineStyle", R"(<interpolation/>)");
+    EXPECT_EQ(element(u"path_a").getStyle(), added);
+}
+
+TEST_F(Interpolation, MissingValuesOnlyWhereTheSourceSetsNoBreakRepresentation) {
+    const Chart source = linesAreasAndPaths();
+    import(u"lineStyle", R"(<interpolation missingRepresentation="wings"/>)", &source);
+    EXPECT_EQ(element(u"line_a").getBreakRepresentation(), 3);
+    EXPECT_EQ(utf8(element(u"line_a").GetAttribute(u"breakRepresentation")), "wings");
+    EXPECT_FALSE(element(u"line_b").isBreakRepresentationPresent()); // not matching
+    EXPECT_FALSE(element(u"area_a").isBreakRepresentationPresent());
+
+    import(u"c-o-n-t-a-i-n-er", R"(<interpolation missingRepresentation="interpolated"/>)", &source);
+    for (const char16_t* id : {u"line_a", u"line_b", u"area_a"})
+        EXPECT_EQ(element(id).getBreakRepresentation(), 2) << utf8(id);
+    import(u"lineStyle", R"(<interpolation missingRepresentation="gap"/>)", &source);
+    EXPECT_EQ(element(u"line_a").getBreakRepresentation(), 1);
+    import(u"lineStyle", R"(<interpolation missingRepresentation="dots"/>)", &source);
+    EXPECT_EQ(element(u"line_a").getBreakRepresentation(), 1);
+}
+
+TEST_F(Interpolation, MissingValuesNeedASourceHoldingTheElement) {
+    import(u"lineStyle", R"(<interpolation missingRepresentation="gap"/>)");
+    EXPECT_FALSE(element(u"line_a").isBreakRepresentationPresent());
+
+    Chart source = linesAreasAndPaths();
+    GrxBaseElement::wrapperOf<CTElementType>(source.vis->getElementById(u"line_a"))
+        ->setBreakRepresentation(2);
+    import(u"lineStyle", R"(<interpolation missingRepresentation="gap"/>)", &source);
+    EXPECT_FALSE(element(u"line_a").isBreakRepresentationPresent());
+
+    const Chart elsewhere = Chart::empty();
+    import(u"lineStyle", R"(<interpolation missingRepresentation="gap"/>)", &elsewhere);
+    EXPECT_FALSE(element(u"line_a").isBreakRepresentationPresent());
+}
+
+TEST_F(Interpolation, SampleLinesAreSteppedAndTheirSourceBreakKept) {
+    const Chart source = styleimport_test::sample("line-series.xml");
+    Chart chart = styleimport_test::sample("line-series.xml");
+    const DOMElement* e = elements_.make(
+        R"(<style><interpolation type="step" pointPosition="right" missingRepresentation="wings"/></style>)");
+    ASSERT_NE(e, nullptr);
+    Probe(source.vis.get(), *chart.vis, nullptr).importStyle(e, *chart.vis->getStyleById(u"lineStyle"));
+    auto* line = GrxBaseElement::wrapperOf<CTElementType>(chart.vis->getElementById(u"line_1"));
+    ASSERT_NE(line, nullptr);
+    ASSERT_EQ(line->getSmoothStatistics().size(), 1u);
+    EXPECT_EQ(line->getSmoothStatistics().front()->getMethod(), 14);
+    EXPECT_EQ(line->getBreakRepresentation(), 1); // "gap" in the chart's own definition
+}
+
+} // namespace
