@@ -1,6 +1,8 @@
 // Copying the content of one chart object onto another under fresh ids.
 #include "CloneSupport.h"
 
+#include <filesystem>
+
 using namespace XERCES_CPP_NAMESPACE;
 using namespace clone_test;
 using engine_test::Chart;
@@ -460,10 +462,15 @@ TEST_F(Cloning, CloneLegendEntryAddsATargetPerMatchingTargetOfEveryLegend) {
 TEST(ClonedSamples, StayValidWithUniqueIds) {
     plotaid::detail::XercesRuntime runtime;
     const bool lint = haveXmllint();
-    for (const char* name :
-         {"scatter.xml", "line-series.xml", "area.xml", "boxplot.xml", "clustered-bar.xml", "dual-y-axis.xml",
-          "error-bars.xml", "stacked-bar.xml", "scatterplot-matrix.xml"}) {
-        Chart chart = Chart::parse(engine_test::example(std::string("charts/") + name));
+    std::vector<std::string> names;
+    for (const auto& entry :
+         std::filesystem::directory_iterator(std::string(PLOTAID_EXAMPLES_DIR) + "/charts"))
+        if (entry.path().extension() == ".xml")
+            names.push_back(entry.path().filename().string());
+    ASSERT_GE(names.size(), 10u);
+    std::size_t labelings = 0;
+    for (const std::string& name : names) {
+        Chart chart = Chart::parse(engine_test::example("charts/" + name));
         ASSERT_TRUE(chart.vis) << name;
         Probe probe(nullptr, *chart.vis, nullptr);
         std::size_t clones = 0;
@@ -473,8 +480,10 @@ TEST(ClonedSamples, StayValidWithUniqueIds) {
             for (CTElementType* element : elements) {
                 probe.cloneElementChildren(*element, graph->addLine(), true);
                 probe.cloneElementChildren(*element, graph->addPoint(), true);
-                for (GrxLabeling* labeling : element->getLabelings())
+                for (GrxLabeling* labeling : element->getLabelings()) {
                     probe.cloneElementAesthetics(*element, *labeling, true);
+                    ++labelings;
+                }
                 clones += 2;
             }
         }
@@ -486,6 +495,7 @@ TEST(ClonedSamples, StayValidWithUniqueIds) {
             EXPECT_EQ(xmllintFaults(text), "") << name;
         }
     }
+    EXPECT_GT(labelings, 0u);
 }
 
 } // namespace
