@@ -94,6 +94,13 @@ public:
 private:
     void initialize(const XMLCh* text);
 
+    struct Property {
+        const XMLCh* name;
+        ChartString ChartStyleValue::*field;
+    };
+    // Every field but the unknown one, in the order getValue writes them.
+    static const Property kProperties[32];
+
     ChartString depth_;
     ChartString fillPattern_;
     ChartString fill_;

@@ -59,45 +59,42 @@ ChartStyleValue::ChartStyleValue(const ChartStyleValue& other) = default;
 ChartStyleValue& ChartStyleValue::operator=(const ChartStyleValue& other) = default;
 ChartStyleValue::~ChartStyleValue() = default;
 
-namespace {
-
-struct Property {
-    const XMLCh* name;
-    ChartString ChartStyleValue::*field;
+const ChartStyleValue::Property ChartStyleValue::kProperties[32] = {
+    {GrxUni::_depth, &ChartStyleValue::depth_},
+    {_fill_pattern, &ChartStyleValue::fillPattern_},
+    {GrxUni::_fill, &ChartStyleValue::fill_},
+    {GrxUni::_color, &ChartStyleValue::primaryColor_},
+    {GrxUni::_color2, &ChartStyleValue::secondaryColor_},
+    {GrxUni::_font_family, &ChartStyleValue::fontFamily_},
+    {GrxUni::_font_style, &ChartStyleValue::fontStyle_},
+    {GrxUni::_font_size, &ChartStyleValue::fontSize_},
+    {GrxUni::_font_weight, &ChartStyleValue::fontWeight_},
+    {_label_location_inside, &ChartStyleValue::labelLocationInside_},
+    {_label_location_x, &ChartStyleValue::labelLocationX_},
+    {_label_location_y, &ChartStyleValue::labelLocationY_},
+    {GrxUni::_margin, &ChartStyleValue::margin_},
+    {_max_width, &ChartStyleValue::maxWidth_},
+    {GrxUni::_padding, &ChartStyleValue::padding_},
+    {GrxUni::_shadow, &ChartStyleValue::shadow_},
+    {GrxUni::_shadow_dx, &ChartStyleValue::shadowDx_},
+    {GrxUni::_shadow_dy, &ChartStyleValue::shadowDy_},
+    {GrxUni::_shadow_opacity, &ChartStyleValue::shadowOpacity_},
+    {GrxUni::_stroke, &ChartStyleValue::stroke_},
+    {GrxUni::_stroke_dasharray, &ChartStyleValue::strokeDasharray_},
+    {GrxUni::_stroke_linecap, &ChartStyleValue::strokeLinecap_},
+    {GrxUni::_stroke_width, &ChartStyleValue::strokeWidth_},
+    {_visibility, &ChartStyleValue::visibility_},
+    {GrxUni::_width, &ChartStyleValue::width_},
+    {GrxUni::_text_fit, &ChartStyleValue::textFit_},
+    {_min_font_size, &ChartStyleValue::minFontSize_},
+    {GrxUni::_size, &ChartStyleValue::size_},
+    {GrxUni::_symbol, &ChartStyleValue::symbol_},
+    {GrxUni::_glyph_sides, &ChartStyleValue::glyphSides_},
+    {GrxUni::_glyph_angle, &ChartStyleValue::glyphAngle_},
+    {GrxUni::_glyph_aspect, &ChartStyleValue::glyphAspect_},
 };
 
-} // namespace
-
-// The named fields in the order getValue writes them.
-#define PLOTAID_STYLE_PROPERTIES                                                                             \
-    {GrxUni::_depth, &ChartStyleValue::depth_}, {_fill_pattern, &ChartStyleValue::fillPattern_},             \
-        {GrxUni::_fill, &ChartStyleValue::fill_}, {GrxUni::_color, &ChartStyleValue::primaryColor_},         \
-        {GrxUni::_color2, &ChartStyleValue::secondaryColor_},                                                \
-        {GrxUni::_font_family, &ChartStyleValue::fontFamily_},                                               \
-        {GrxUni::_font_style, &ChartStyleValue::fontStyle_},                                                 \
-        {GrxUni::_font_size, &ChartStyleValue::fontSize_},                                                   \
-        {GrxUni::_font_weight, &ChartStyleValue::fontWeight_},                                               \
-        {_label_location_inside, &ChartStyleValue::labelLocationInside_},                                    \
-        {_label_location_x, &ChartStyleValue::labelLocationX_},                                              \
-        {_label_location_y, &ChartStyleValue::labelLocationY_},                                              \
-        {GrxUni::_margin, &ChartStyleValue::margin_}, {_max_width, &ChartStyleValue::maxWidth_},             \
-        {GrxUni::_padding, &ChartStyleValue::padding_}, {GrxUni::_shadow, &ChartStyleValue::shadow_},        \
-        {GrxUni::_shadow_dx, &ChartStyleValue::shadowDx_},                                                   \
-        {GrxUni::_shadow_dy, &ChartStyleValue::shadowDy_},                                                   \
-        {GrxUni::_shadow_opacity, &ChartStyleValue::shadowOpacity_},                                         \
-        {GrxUni::_stroke, &ChartStyleValue::stroke_},                                                        \
-        {GrxUni::_stroke_dasharray, &ChartStyleValue::strokeDasharray_},                                     \
-        {GrxUni::_stroke_linecap, &ChartStyleValue::strokeLinecap_},                                         \
-        {GrxUni::_stroke_width, &ChartStyleValue::strokeWidth_},                                             \
-        {_visibility, &ChartStyleValue::visibility_}, {GrxUni::_width, &ChartStyleValue::width_},            \
-        {GrxUni::_text_fit, &ChartStyleValue::textFit_}, {_min_font_size, &ChartStyleValue::minFontSize_},   \
-        {GrxUni::_size, &ChartStyleValue::size_}, {GrxUni::_symbol, &ChartStyleValue::symbol_},              \
-        {GrxUni::_glyph_sides, &ChartStyleValue::glyphSides_},                                               \
-        {GrxUni::_glyph_angle, &ChartStyleValue::glyphAngle_},                                               \
-        {GrxUni::_glyph_aspect, &ChartStyleValue::glyphAspect_},
-
 void ChartStyleValue::initialize(const XMLCh* text) {
-    static const Property properties[] = {PLOTAID_STYLE_PROPERTIES};
     if (text == nullptr)
         return;
     for (std::u16string_view declaration : pieces(std::u16string_view(text), u';')) {
@@ -108,7 +105,7 @@ void ChartStyleValue::initialize(const XMLCh* text) {
         // With two colons the value is the piece after the second one.
         const std::u16string value = tokens.size() > 1 ? std::u16string(tokens.back()) : std::u16string();
         const Property* match = nullptr;
-        for (const Property& p : properties)
+        for (const Property& p : kProperties)
             if (name == p.name) {
                 match = &p;
                 break;
@@ -128,9 +125,8 @@ void ChartStyleValue::initialize(const XMLCh* text) {
 }
 
 ChartString ChartStyleValue::getValue() const {
-    static const Property properties[] = {PLOTAID_STYLE_PROPERTIES};
     ChartString text;
-    for (const Property& p : properties) {
+    for (const Property& p : kProperties) {
         const ChartString& value = this->*p.field;
         if (value.empty())
             continue;
@@ -145,8 +141,6 @@ ChartString ChartStyleValue::getValue() const {
     }
     return text;
 }
-
-#undef PLOTAID_STYLE_PROPERTIES
 
 // ---- importing a style element --------------------------------------------------------------------
 
