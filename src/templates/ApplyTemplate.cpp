@@ -29,7 +29,7 @@ const char* const kFile = "backend/chartxml/plotaid/src/templates/applytemplate"
 
 // Tested in this order, first match wins; a null factory is a class not built yet.
 const InstructionEntry kInstructions[] = {
-    {u"setStyle", "TStyle", nullptr},
+    {u"setStyle", "TStyle", makeAction<TStyle>},
     {u"addFrame", "TAddFrame", nullptr},
     {u"addHistogramSummaryFrame", "TAddHistogramSummaryFrame", nullptr},
     {u"addImage", "TAddImage", nullptr},

@@ -8,6 +8,7 @@
 
 #include <xercesc/util/XercesDefs.hpp>
 
+#include <cstdint>
 #include <vector>
 
 namespace plotaid::detail {
@@ -24,8 +25,17 @@ public:
     bool apply() override;
 
 private:
-    // Declarations by their "number"; null where the instruction gives none.
+    XERCES_CPP_NAMESPACE::DOMElement* declaration(std::uint64_t number) const;
+    XERCES_CPP_NAMESPACE::DOMElement* declarationForGraph(std::uint64_t graph) const;
+    bool styleById();
+    void styleElements();
+    void styleTexts();
+
+    // Declarations by their "number"; null where the instruction gives none. Only numbers that
+    // can name a graph are kept: a number read from the template can be as large as 2^32 - 1.
     std::vector<XERCES_CPP_NAMESPACE::DOMElement*> declarations_;
+    // One past the largest number given (0 without declarations), as if every number were kept.
+    std::uint64_t extent_ = 0;
 };
 
 } // namespace plotaid::detail
