@@ -1,0 +1,215 @@
+#include "AestheticsSupport.h"
+
+#include "grammar/GrammarSupport.h"
+
+#include "foundation/ValidatingParser.h"
+
+#include <plotaid/ChartException.h>
+#include <plotaid/ChartTemplate.h>
+
+#include <grx/GrxUni.h>
+
+#include <xercesc/dom/DOM.hpp>
+
+#include <algorithm>
+#include <set>
+
+using namespace XERCES_CPP_NAMESPACE;
+
+namespace aesthetics_test {
+
+namespace {
+
+const std::string kHead = "<?xml version=\"1.0\" encoding=\"UTF-8\"?>\n"
+                          "<template xmlns=\"http://plotaid.org/grxml\" "
+                          "xmlns:xsi=\"http://www.w3.org/2001/XMLSchema-instance\" "
+                          "xsi:schemaLocation=\"http://plotaid.org/grxml "
+                          "http://plotaid.org/grxml/grxml-template-3.5.xsd\">";
+
+const DOMElement* firstElementChild(const DOMNode* node) {
+    for (const DOMNode* n = node->getFirstChild(); n != nullptr; n = n->getNextSibling())
+        if (n->getNodeType() == DOMNode::ELEMENT_NODE)
+            return static_cast<const DOMElement*>(n);
+    return nullptr;
+}
+
+std::map<std::string, std::string> attributesOf(const DOMElement* e, bool withId) {
+    std::map<std::string, std::string> out;
+    const DOMNamedNodeMap* map = e->getAttributes();
+    for (XMLSize_t i = 0; i < map->getLength(); ++i) {
+        const std::string name = text(map->item(i)->getNodeName());
+        if (withId || name != "id")
+            out[name] = text(map->item(i)->getNodeValue());
+    }
+    return out;
+}
+
+std::string describeStyles(const DOMElement* styleCycle) {
+    std::string out = "[";
+    for (const DOMElement* cycle = styleCycle->getFirstElementChild(); cycle;
+         cycle = cycle->getNextElementSibling()) {
+        out += "(";
+        for (const DOMElement* style = cycle->getFirstElementChild(); style;
+             style = style->getNextElementSibling()) {
+            out += "{";
+            for (const auto& [name, value] : attributesOf(style, false))
+                out += name + "=" + value + ";";
+            out += "}";
+        }
+        out += ")";
+    }
+    return out + "]";
+}
+
+void writeCanonical(const DOMElement* e, const DOMDocument* document, std::string& out, int depth) {
+    const std::string name = text(e->getTagName());
+    if (depth == 1 && name == "styleCycle")
+        return;
+    out += std::string(static_cast<std::size_t>(depth) * 2, ' ') + "<" + name;
+    for (const auto& [attr, value] : attributesOf(e, true)) {
+        if (attr == "cycle") {
+            const DOMElement* referred = document->getElementById(ChartString(value).xc_str());
+            out += " cycle=" + (referred != nullptr ? describeStyles(referred) : "dangling:" + value);
+        } else {
+            out += " " + attr + "=\"" + value + "\"";
+        }
+    }
+    out += ">\n";
+    for (const DOMNode* n = e->getFirstChild(); n != nullptr; n = n->getNextSibling()) {
+        if (n->getNodeType() == DOMNode::ELEMENT_NODE) {
+            writeCanonical(static_cast<const DOMElement*>(n), document, out, depth + 1);
+        } else if (n->getNodeType() == DOMNode::TEXT_NODE) {
+            const std::string t = text(n->getNodeValue());
+            if (t.find_first_not_of(" \t\r\n") != std::string::npos)
+                out += std::string(static_cast<std::size_t>(depth + 1) * 2, ' ') + t + "\n";
+        }
+    }
+}
+
+} // namespace
+
+std::string templateOf(const std::string& body) {
+    return kHead + body + "</template>";
+}
+
+struct Instruction::Holder {
+    plotaid::detail::ValidatingParser parser;
+};
+
+Instruction::Instruction(const std::string& instructionXml) : holder_(std::make_unique<Holder>()) {
+    DOMDocument* document = holder_->parser.parse(templateOf(instructionXml), "instruction",
+                                                  ChartException("test template", "aesthetics_test", 0));
+    if (document != nullptr)
+        element_ = firstElementChild(document->getDocumentElement());
+}
+
+Instruction::~Instruction() = default;
+
+std::vector<plotaid::detail::InstructionOutcome>
+applyTemplate(GrxVisualization& target, const std::string& body, GrxVisualization* source) {
+    plotaid::detail::WalkReport report;
+    ChartTemplate chartTemplate(target, source);
+    EXPECT_TRUE(chartTemplate.setTemplate(templateOf(body))) << body;
+    chartTemplate.applyTemplate();
+    return report.outcomes();
+}
+
+std::string chartWith(const std::string& graphBody, const std::string& extra) {
+    return "<?xml version=\"1.0\" encoding=\"UTF-8\"?>\n"
+           "<visualization xmlns=\"http://plotaid.org/grxml\" "
+           "xmlns:xsi=\"http://www.w3.org/2001/XMLSchema-instance\" "
+           "xsi:schemaLocation=\"http://plotaid.org/grxml http://plotaid.org/grxml/grxml-2.9.xsd\" "
+           "id=\"visualization\">\n"
+           "  <style id=\"plainStyle\" color=\"#112233\"/>\n"
+           "  <style id=\"otherStyle\" color2=\"#445566\"/>\n"
+           "  <sourceVariable id=\"var_a\" source=\"data\" sourceName=\"a\" categorical=\"1\"/>\n"
+           "  <sourceVariable id=\"var_b\" source=\"data\" sourceName=\"b\" categorical=\"0\"/>\n"
+           "  <categoricalDomain id=\"domain_a\"><variableReference "
+           "variable=\"var_a\"/></categoricalDomain>\n"
+           "  <styleCycle id=\"chartCycle\"><cycle><style color=\"red\"/><style "
+           "color=\"blue\"/></cycle></styleCycle>\n"
+           "  <graph id=\"graph_1\">\n"
+           "    <coordinates id=\"coordinates_1\"><dimension id=\"dim_x\"/><dimension "
+           "id=\"dim_y\"/></coordinates>\n" +
+           graphBody + "  </graph>\n" + extra + "  <userSource id=\"data\"/>\n</visualization>\n";
+}
+
+std::string canonical(const GrxVisualization& chart) {
+    const GrxBaseElement& root = chart;
+    std::string out;
+    writeCanonical(root.getImplementation(), root.getImplementation()->getOwnerDocument(), out, 0);
+    return out;
+}
+
+std::size_t orphanedStyleCycles(const GrxVisualization& chart) {
+    const GrxBaseElement& root = chart;
+    std::set<std::string> referred;
+    const DOMNodeList* all = root.getImplementation()->getElementsByTagName(u"*");
+    for (XMLSize_t i = 0; i < all->getLength(); ++i)
+        for (const auto& [name, value] : attributesOf(static_cast<const DOMElement*>(all->item(i)), false))
+            referred.insert(value);
+    std::size_t orphans = 0;
+    for (const GrxStyleCycle* cycle : chart.getStyleCycles())
+        orphans += referred.count(text(cycle->getId())) == 0 ? 1 : 0;
+    return orphans;
+}
+
+std::string text(const XMLCh* value) {
+    return ChartString(value).toUTF8();
+}
+
+std::string attribute(const GrxBaseElement& element, const std::string& name) {
+    return text(element.GetAttribute(ChartString(name).xc_str()));
+}
+
+std::vector<std::map<std::string, std::string>> cycleStyles(const GrxStyleCycle& styleCycle) {
+    std::vector<std::map<std::string, std::string>> out;
+    const std::vector<GrxCycle*> cycles = styleCycle.getCycles();
+    if (cycles.empty())
+        return out;
+    for (const GrxStyle* style : cycles.front()->getStyles())
+        out.push_back(attributesOf(style->getImplementation(), false));
+    return out;
+}
+
+std::string cycleIdOf(const GrxVisualization& chart, const std::string& aestheticId) {
+    const CTAesthetic* aesthetic = byId<CTAesthetic>(chart, aestheticId);
+    const GrxStyleCycle* cycle = aesthetic != nullptr ? aesthetic->getCycle() : nullptr;
+    return cycle != nullptr ? text(cycle->getId()) : std::string();
+}
+
+std::vector<std::map<std::string, std::string>> cycleStylesOf(const GrxVisualization& chart,
+                                                              const std::string& aestheticId) {
+    const CTAesthetic* aesthetic = byId<CTAesthetic>(chart, aestheticId);
+    const GrxStyleCycle* cycle = aesthetic != nullptr ? aesthetic->getCycle() : nullptr;
+    return cycle != nullptr ? cycleStyles(*cycle) : std::vector<std::map<std::string, std::string>>();
+}
+
+std::string xercesProblems(const GrxVisualization& chart) {
+    plotaid::detail::ValidatingParser parser;
+    const std::string written = chart.AsUTF8();
+    if (parser.parse(written, "written chart", ChartException("written chart", "aesthetics_test", 0)) !=
+        nullptr)
+        return std::string();
+    std::string out;
+    for (const std::string& e : parser.lastErrors())
+        out += e + "\n";
+    return out.empty() ? std::string("refused") : out;
+}
+
+std::string xmllintProblems(const GrxVisualization& chart, bool* skipped) {
+    if (skipped != nullptr)
+        *skipped = false;
+    if (!grammar_test::haveXmllint()) {
+        if (skipped != nullptr)
+            *skipped = true;
+        return std::string();
+    }
+    static int serial = 0;
+    const std::string file =
+        grammar_test::writeScratch("chart" + std::to_string(++serial) + ".xml", chart.AsUTF8());
+    const grammar_test::LintResult r = grammar_test::xmllint("grxml-2.9.xsd", file);
+    return r.exitCode == 0 ? std::string() : r.output;
+}
+
+} // namespace aesthetics_test
