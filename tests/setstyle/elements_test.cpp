@@ -5,7 +5,7 @@ using namespace setstyle_test;
 
 namespace {
 
-struct GraphSpec {
+struct GraphPlan {
     std::string id;
     std::string elements; // element XML; "COORD" stands for this graph's coordinates id
     bool polar = false;
@@ -13,7 +13,7 @@ struct GraphSpec {
     bool clustered = false;
 };
 
-std::string graphXml(const GraphSpec& g) {
+std::string graphXml(const GraphPlan& g) {
     std::string coordinates = "c_" + g.id;
     std::string xml = "<graph id=\"" + g.id + "\"><coordinates id=\"" + coordinates + "\">";
     if (g.polar)
@@ -31,11 +31,11 @@ std::string graphXml(const GraphSpec& g) {
 }
 
 // Styles s1 .. s9 (black, each its own) and the graphs.
-std::string chartWith(const std::vector<GraphSpec>& graphs, const std::string& extra = std::string()) {
+std::string chartWith(const std::vector<GraphPlan>& graphs, const std::string& extra = std::string()) {
     std::string body = "<sourceVariable id=\"cluster\"/>";
     for (int i = 1; i <= 9; ++i)
         body += "<style id=\"s" + std::to_string(i) + "\" color=\"black\"/>";
-    for (const GraphSpec& g : graphs)
+    for (const GraphPlan& g : graphs)
         body += graphXml(g);
     return chartOf(body + extra);
 }
