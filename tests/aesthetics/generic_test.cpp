@@ -51,6 +51,24 @@ TEST_F(SetGenericAttributes, EveryMatchingNodeTakesTheAttributes) {
     EXPECT_EQ(written(*chart.vis, "frame_1", "data-note"), "");
 }
 
+TEST_F(SetGenericAttributes, OnASampleChartTheTitleAndTickLengthsChange) {
+    Chart chart = Chart::parse(engine_test::example("charts/line-series.xml"));
+    ASSERT_TRUE(chart.vis);
+    EXPECT_TRUE(
+        applyAction<TSetGenericAttributes>("<setGenericAttributes elementName=\"text\" parentName=\"label\" "
+                                           "count=\"1\" text=\"Quarterly Sales\"/>",
+                                           *chart.vis));
+    EXPECT_EQ(text(byId<GrxLabel>(*chart.vis, "title_1_label")->getAllText().xc_str()), "Quarterly Sales");
+    EXPECT_EQ(text(byId<GrxLabel>(*chart.vis, "subtitle_1_label")->getAllText().xc_str()),
+              "Fiscal year 2025");
+    EXPECT_TRUE(applyAction<TSetGenericAttributes>(
+        "<setGenericAttributes elementName=\"majorTicks\" length=\"8pt\"/>", *chart.vis));
+    EXPECT_EQ(written(*chart.vis, "dim_x_majorTicks", "length"), "8pt");
+    EXPECT_EQ(written(*chart.vis, "dim_y_majorTicks", "length"), "8pt");
+    EXPECT_EQ(xercesProblems(*chart.vis), "");
+    EXPECT_EQ(xmllintProblems(*chart.vis), "");
+}
+
 TEST_F(SetGenericAttributes, CountPicksTheNthMatchAndParentNameNarrowsWhatIsCounted) {
     Chart chart = labels();
     ASSERT_TRUE(chart.vis);
@@ -159,13 +177,16 @@ TEST_F(SetGenericAttributes, NothingToFindOrNothingToWriteIsAFailure) {
     EXPECT_EQ(chart.vis->AsUTF8(), before);
 }
 
-TEST_F(SetGenericAttributes, AnInstructionIdIsNeverSpreadOverTheChart) {
+TEST_F(SetGenericAttributes, TheInstructionsIdAndQualifiedAttributesStayInTheTemplate) {
     Chart chart = labels();
     ASSERT_TRUE(chart.vis);
     EXPECT_TRUE(applyAction<TSetGenericAttributes>(
-        "<setGenericAttributes id=\"rule7\" elementName=\"label\" data-x=\"1\"/>", *chart.vis));
+        "<setGenericAttributes id=\"rule7\" elementName=\"label\" xml:space=\"preserve\" data-x=\"1\"/>",
+        *chart.vis));
     EXPECT_EQ(written(*chart.vis, "label_1", "data-x"), "1");
     EXPECT_EQ(chart.vis->getElementById(ChartString("rule7")), nullptr);
+    // Attributes of the template document's own vocabularies stay there.
+    EXPECT_FALSE(byId<GrxLabel>(*chart.vis, "label_1")->getImplementation()->hasAttribute(u"xml:space"));
     EXPECT_EQ(xercesProblems(*chart.vis), "");
 }
 

@@ -530,13 +530,16 @@ struct TSetGenericAttributes::Settings {
     }
 
     // The selectors are the instruction's own. An id written onto several chart objects would
-    // take it from all but one, and namespace declarations are no attributes of the chart.
-    static bool copied(const XMLCh* name) {
+    // take it from all but one. Namespace declarations and qualified attributes (xsi:type,
+    // xml:space) belong to the template document, not to the chart.
+    static bool copied(const DOMNode& attribute) {
+        const XMLCh* name = attribute.getNodeName();
         for (const XMLCh* selector : {kElementName, static_cast<const XMLCh*>(GrxUni::_count), kStyleName,
                                       kParentName, static_cast<const XMLCh*>(GrxUni::_id), kXmlns})
             if (XMLString::equals(name, selector))
                 return false;
-        return !XMLString::startsWith(name, u"xmlns:");
+        const XMLCh* uri = attribute.getNamespaceURI();
+        return (uri == nullptr || *uri == 0) && XMLString::indexOf(name, chColon) < 0;
     }
 };
 
@@ -594,9 +597,9 @@ bool TSetGenericAttributes::apply() {
 
         for (XMLSize_t i = 0; i < s.attributes->getLength(); ++i) {
             const DOMNode* attribute = s.attributes->item(i);
-            const XMLCh* name = attribute->getNodeName();
-            if (!Settings::copied(name))
+            if (!Settings::copied(*attribute))
                 continue;
+            const XMLCh* name = attribute->getNodeName();
             const XMLCh* value = attribute->getNodeValue();
             if (own != nullptr) {
                 if (*own->getAttribute(name) == 0)
