@@ -130,6 +130,26 @@ TEST_F(SetColor, ElementsOfOneTagShareOneNewCycleAndOtherTagsGetTheirOwn) {
     EXPECT_EQ(cycleStylesOf(*chart.vis, "c3"), kTemplateStyles);
 }
 
+TEST_F(SetColor, WithAnAestheticNumberTheSameColourOfAnEarlierElementIsShared) {
+    Chart chart = Chart::parse(chartWith("    <interval id=\"bars_1\" coordinates=\"coordinates_1\">\n"
+                                         "      <color id=\"a1\" variable=\"var_a\" cycle=\"chartCycle\"/>\n"
+                                         "      <color id=\"a2\" variable=\"var_b\"/>\n"
+                                         "    </interval>\n"
+                                         "    <interval id=\"bars_2\" coordinates=\"coordinates_1\">\n"
+                                         "      <color id=\"b1\" variable=\"var_a\" cycle=\"chartCycle\"/>\n"
+                                         "      <color id=\"b2\" variable=\"var_b\"/>\n"
+                                         "    </interval>\n"));
+    ASSERT_TRUE(chart.vis);
+    const std::size_t cyclesBefore = chart.vis->getStyleCycles().size();
+    EXPECT_TRUE(applyAction<TSetColor>(setColor("aestheticNumber=\"2\""), *chart.vis));
+    // The second bars continue the first bars' new cycle, not the cycle of their first colour.
+    EXPECT_EQ(chart.vis->getStyleCycles().size(), cyclesBefore + 1);
+    EXPECT_EQ(cycleStylesOf(*chart.vis, "a2"), kTemplateStyles);
+    EXPECT_EQ(cycleIdOf(*chart.vis, "b2"), cycleIdOf(*chart.vis, "a2"));
+    EXPECT_EQ(cycleIdOf(*chart.vis, "a1"), "chartCycle");
+    EXPECT_EQ(cycleIdOf(*chart.vis, "b1"), "chartCycle");
+}
+
 TEST_F(SetColor, ASourceThatSetsTheCycleKeepsTheColourAsItIs) {
     const std::string chartText = engine_test::example("charts/error-bars.xml");
     Chart chart = Chart::parse(chartText);

@@ -222,14 +222,18 @@ struct TSetColor::Settings {
     }
 
     // Elements of one tag in a graph show one series each: they continue the first one's cycle.
-    static GrxStyleCycle* sharedCycle(const std::vector<CTElementType*>& elements, std::size_t k) {
+    // With an aesthetic number only that colour of an earlier element is taken, so a second
+    // colour never continues the cycle of an earlier element's first one.
+    GrxStyleCycle* sharedCycle(const std::vector<CTElementType*>& elements, std::size_t k) const {
         const XMLCh* tag = elements[k]->getImplementation()->getTagName();
         for (std::size_t j = 0; j < k; ++j) {
             if (!XMLString::equals(elements[j]->getImplementation()->getTagName(), tag))
                 continue;
-            for (GrxColor* earlier : elements[j]->getColors())
-                if (GrxStyleCycle* cycle = earlier->getCycle())
-                    return cycle;
+            const std::vector<GrxColor*> earlier = elements[j]->getColors();
+            for (std::size_t p = 1; p <= earlier.size(); ++p)
+                if (selects(aestheticNumber, p))
+                    if (GrxStyleCycle* cycle = earlier[p - 1]->getCycle())
+                        return cycle;
         }
         return nullptr;
     }
@@ -254,7 +258,7 @@ bool TSetColor::apply() {
                         color.removeCycle();
                         s.setAffect(color);
                         if (k != 0)
-                            if (GrxStyleCycle* shared = Settings::sharedCycle(elements, k)) {
+                            if (GrxStyleCycle* shared = s.sharedCycle(elements, k)) {
                                 color.setCycle(*shared);
                                 return;
                             }
