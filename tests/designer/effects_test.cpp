@@ -128,6 +128,28 @@ TEST_F(CorporateLook, HistogramBinsAreStyledAsSuchAndPointsAndAreasKeepTheirFill
     EXPECT_EQ(attrOf(area, "areaStyle", "opacity"), "0.8");
 }
 
+// No sample chart varies a pattern; a variant of the bar chart does. Patterns are drawn on white:
+// with no source visualization that says otherwise, the bars' own colour gives way.
+TEST_F(CorporateLook, PatternedBarsCycleThroughHatchesOnWhite) {
+    std::string text = engine_test::example("charts/simple-bar.xml");
+    const std::string at = "<color id=\"color_1\"";
+    const std::string::size_type where = text.find(at);
+    ASSERT_NE(where, std::string::npos);
+    text.insert(where, "<pattern id=\"pattern_1\" variable=\"var_jobcat\" cycle=\"styleCycleRepository\" "
+                       "domain=\"domain_jobcat\"/>");
+    Chart c = Chart::parse(text);
+    ASSERT_TRUE(c.vis);
+    ChartTemplate t(*c.vis, nullptr);
+    ASSERT_TRUE(t.setTemplate(engine_test::example("templates/corporate.sgt")));
+    t.applyTemplate();
+    const DOMElement* pattern = byId(c, "pattern_1");
+    ASSERT_NE(pattern, nullptr);
+    EXPECT_EQ(attrs(cycleStyles(c, pattern), "pattern"), (std::vector<std::string>{"0", "3", "5", "7"}));
+    EXPECT_EQ(attrOf(c, "barStyle", "color"), "white");
+    // The outline keeps the brand colour the bar declaration gave it.
+    EXPECT_EQ(attrOf(c, "barStyle", "color2"), "#0B2540");
+}
+
 using MonochromeLook = EngineTest;
 
 TEST_F(MonochromeLook, TheLineChartLosesItsColourAestheticToADashInGreys) {
