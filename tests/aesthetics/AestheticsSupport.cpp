@@ -1,6 +1,6 @@
 #include "AestheticsSupport.h"
 
-#include "grammar/GrammarSupport.h"
+#include "support/GrammarSupport.h"
 
 #include "foundation/ValidatingParser.h"
 

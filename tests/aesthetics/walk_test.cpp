@@ -3,7 +3,7 @@
 // the same as applied once.
 #include "AestheticsSupport.h"
 
-#include "grammar/GrammarSupport.h"
+#include "support/GrammarSupport.h"
 #include "support/TestSupport.h"
 #include "support/ToolRunner.h"
 

@@ -1,7 +1,7 @@
 // The sample charts are the test bed of the whole library: each must be complete (titles,
 // footnotes, legend, axes with ticks and labels, styles by id, data), and every reference in it
 // must lead to an element of the right kind.
-#include "GrammarSupport.h"
+#include "support/GrammarSupport.h"
 
 #include "foundation/ValidatingParser.h"
 

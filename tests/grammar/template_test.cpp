@@ -1,5 +1,5 @@
 // Template grammars: the walk, not the parse, decides what an instruction is.
-#include "GrammarSupport.h"
+#include "support/GrammarSupport.h"
 
 #include <gtest/gtest.h>
 

@@ -1,6 +1,6 @@
 // The grammars as the library reads them: Xerces-C with the library's own parser settings,
 // schemas found by file name in the resource folder.
-#include "GrammarSupport.h"
+#include "support/GrammarSupport.h"
 
 #include "foundation/ValidatingParser.h"
 

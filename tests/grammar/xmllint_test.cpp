@@ -1,5 +1,5 @@
 // The grammars checked by xmllint, a validator independent of the Xerces-C the library uses.
-#include "GrammarSupport.h"
+#include "support/GrammarSupport.h"
 
 #include <gtest/gtest.h>
 

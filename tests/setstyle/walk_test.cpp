@@ -2,7 +2,7 @@
 // applied twice, and every restyled sample chart checked by both validators.
 #include "StyleSupport.h"
 
-#include "grammar/GrammarSupport.h"
+#include "support/GrammarSupport.h"
 #include "support/TestSupport.h"
 #include "support/ToolRunner.h"
 

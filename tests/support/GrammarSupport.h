@@ -1,8 +1,16 @@
 #ifndef PLOTAID_TESTS_GRAMMAR_GRAMMARSUPPORT_H
 #define PLOTAID_TESTS_GRAMMAR_GRAMMARSUPPORT_H
 
+#include <xercesc/util/XercesDefs.hpp>
+
 #include <string>
 #include <vector>
+
+XERCES_CPP_NAMESPACE_BEGIN
+class DOMDocument;
+XERCES_CPP_NAMESPACE_END
+
+class GrxVisualization;
 
 namespace grammar_test {
 
@@ -32,6 +40,17 @@ bool haveXmllint();
 // Points the library (and tools started from the test) at a resource folder that holds the
 // source tree's grammars, so the resolver finds them by file name.
 void useSourceGrammars();
+
+// Soundness of a chart the library produced, each empty when sound (else what is wrong):
+// what the library's own validating parser says of the text;
+std::string xercesFaults(const std::string& chart);
+// what xmllint says of it against grxml-2.9.xsd (empty as well when xmllint is missing);
+std::string xmllintFaults(const std::string& chart);
+// ids held by more than one element (the library's parser lets them pass);
+std::string duplicateIds(const XERCES_CPP_NAMESPACE::DOMDocument* document);
+// all three, on the chart printed as the library prints it.
+std::string chartFaults(const std::string& chart);
+std::string chartFaults(const GrxVisualization& chart);
 
 // The data document of a small store, byte for byte as the XML data handler writes it.
 std::string dataDocument(const std::string& sources);

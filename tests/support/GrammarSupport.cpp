@@ -1,4 +1,14 @@
-#include "GrammarSupport.h"
+#include "support/GrammarSupport.h"
+
+#include "foundation/ValidatingParser.h"
+
+#include <plotaid/ChartException.h>
+
+#include <grx/GrxModel.h>
+
+#include <xercesc/dom/DOM.hpp>
+
+#include <map>
 
 #include <algorithm>
 #include <cstdio>
@@ -144,6 +154,56 @@ std::string dataDocument(const std::string& sources) {
            "xsi:schemaLocation=\"http://plotaid.org/grxml/data "
            "http://plotaid.org/grxml/data/grxml-data-2.1.xsd\">\n" +
            sources + "</gs:graphSources>\n";
+}
+
+std::string xercesFaults(const std::string& chart) {
+    plotaid::detail::ValidatingParser parser;
+    if (parser.parse(chart, "chart", ChartException("chart under test", "grammar_test", 0)) != nullptr)
+        return std::string();
+    std::string out = "Xerces rejects the chart: ";
+    for (const std::string& e : parser.lastErrors())
+        out += e + "; ";
+    return out;
+}
+
+std::string xmllintFaults(const std::string& chart) {
+    if (!haveXmllint())
+        return std::string();
+    static unsigned counter = 0;
+    const std::string file = writeScratch("chart-" + std::to_string(++counter) + ".xml", chart);
+    const LintResult result = xmllint("grxml-2.9.xsd", file);
+    std::remove(file.c_str());
+    return result.exitCode == 0 ? std::string() : "xmllint rejects the chart: " + result.output;
+}
+
+std::string duplicateIds(const XERCES_CPP_NAMESPACE::DOMDocument* document) {
+    using namespace XERCES_CPP_NAMESPACE;
+    std::map<std::string, int> counts;
+    std::vector<const DOMElement*> pending{document->getDocumentElement()};
+    while (!pending.empty()) {
+        const DOMElement* e = pending.back();
+        pending.pop_back();
+        if (e->getAttributeNode(u"id") != nullptr)
+            ++counts[ChartString(e->getAttribute(u"id")).toUTF8()];
+        for (const DOMElement* c = e->getFirstElementChild(); c; c = c->getNextElementSibling())
+            pending.push_back(c);
+    }
+    std::string out;
+    for (const auto& [id, count] : counts)
+        if (count > 1)
+            out += id + " (" + std::to_string(count) + ") ";
+    return out.empty() ? out : "repeated ids: " + out;
+}
+
+std::string chartFaults(const std::string& chart) {
+    const std::string faults = xercesFaults(chart);
+    return faults.empty() ? xmllintFaults(chart) : faults;
+}
+
+std::string chartFaults(const GrxVisualization& chart) {
+    const GrxBaseElement& root = chart;
+    const std::string repeated = duplicateIds(root.getImplementation()->getOwnerDocument());
+    return repeated.empty() ? chartFaults(chart.AsUTF8()) : repeated;
 }
 
 } // namespace grammar_test
