@@ -43,14 +43,25 @@ bool isExcluded(const CTElementType& element) {
                        [&](const XMLCh* word) { return id.ContainsString(word); });
 }
 
-// Every graph of the chart at any depth (inside containers too), in document order.
+// Every graph of the chart, inside containers too, in document order. Graphs sit only directly
+// below the root or a container, so those are all that is walked: a search of the whole document
+// would cost every "setStyle" a pass over every data element.
+void collectGraphs(const DOMElement* parent, std::vector<GrrUviza*>& graphs) {
+    for (const DOMElement* child = parent->getFirstElementChild(); child; child = child->getNextElementSibling()) {
+        const XMLCh* name = child->getLocalName() ? child->getLocalName() : child->getNodeName();
+        if (XMLString::equals(name, GrxUni::_graph)) {
+            if (auto* graph = GrxBaseElement::wrapperOf<GrrUviza>(child))
+                graphs.push_back(graph);
+        } else if (XMLString::equals(name, GrxUni::_container)) {
+            collectGraphs(child, graphs);
+        }
+    }
+}
+
 std::vector<GrrUviza*> allGraphs(const GrxVisualization& target) {
     std::vector<GrrUviza*> graphs;
     const GrxBaseElement& root = target;
-    DOMNodeList* nodes = root.getImplementation()->getElementsByTagName(GrxUni::_graph);
-    for (XMLSize_t i = 0, count = nodes->getLength(); i < count; ++i)
-        if (auto* graph = GrxBaseElement::wrapperOf<GrrUviza>(nodes->item(i)))
-            graphs.push_back(graph);
+    collectGraphs(root.getImplementation(), graphs);
     return graphs;
 }
 
