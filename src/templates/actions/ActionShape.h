@@ -13,8 +13,8 @@
 #define PLOTAID_TEMPLATE_ACTION(Name)                                                                        \
     class Name final : public BaseTemplate {                                                                 \
     public:                                                                                                  \
-        Name(const GrxVisualization* source, GrxVisualization& target,                                      \
-             const XERCES_CPP_NAMESPACE::DOMElement* instruction);                                          \
+        Name(const GrxVisualization* source, GrxVisualization& target,                                       \
+             const XERCES_CPP_NAMESPACE::DOMElement* instruction);                                           \
         ~Name() override;                                                                                    \
         Name(const Name&) = delete;                                                                          \
         Name& operator=(const Name&) = delete;                                                               \
@@ -24,5 +24,13 @@
     private:                                                                                                 \
         std::unique_ptr<Settings> settings_;                                                                 \
     };
+
+// The constructor and destructor every such action has: the settings record is made with the
+// action and pointed back at it. A family's source file says this once per class.
+#define PLOTAID_TEMPLATE_ACTION_LIFETIME(Name)                                                               \
+    Name::Name(const GrxVisualization* source, GrxVisualization& target,                                     \
+               const XERCES_CPP_NAMESPACE::DOMElement* instruction)                                          \
+        : BaseTemplate(source, target, instruction), settings_(std::make_unique<Settings>(*this)) {}         \
+    Name::~Name() = default;
 
 #endif

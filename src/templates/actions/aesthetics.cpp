@@ -179,23 +179,32 @@ bool isPointNode(const DOMNode* node) {
     return node != nullptr && node->getUserData(GrxUni::_point) != nullptr;
 }
 
+// What every cycle action reads: which aesthetics (0: all, n: the n-th of each element) and the
+// styles of their new cycle (the last "cycle" child; none changes no cycle).
+struct CycleSettings {
+    std::uint32_t aestheticNumber = 0;
+    const DOMElement* cycle = nullptr;
+
+    void read(const DOMElement* instruction) {
+        aestheticNumber = aestheticNumberOf(instruction);
+        cycle = lastChildNamed(instruction, GrxUni::_cycle);
+    }
+};
+
 } // namespace
 
 // ---- setColor -------------------------------------------------------------------------------------
 
-struct TSetColor::Settings {
+struct TSetColor::Settings : CycleSettings {
     enum class Affect { Unchanged, Main, Secondary, Both };
 
     TSetColor& action;
-    std::uint32_t aestheticNumber = 0;
-    const DOMElement* cycle = nullptr;
     Affect affect = Affect::Unchanged;
 
     explicit Settings(TSetColor& owner) : action(owner) {}
 
     void read(const DOMElement* instruction) {
-        aestheticNumber = aestheticNumberOf(instruction);
-        cycle = lastChildNamed(instruction, GrxUni::_cycle);
+        CycleSettings::read(instruction);
         const ChartString word = attributeOf(instruction, kAffect);
         affect = word.equals(GrxUni::_main)        ? Affect::Main
                  : word.equals(GrxUni::_secondary) ? Affect::Secondary
@@ -239,10 +248,7 @@ struct TSetColor::Settings {
     }
 };
 
-TSetColor::TSetColor(const GrxVisualization* source, GrxVisualization& target, const DOMElement* instruction)
-    : BaseTemplate(source, target, instruction), settings_(std::make_unique<Settings>(*this)) {}
-
-TSetColor::~TSetColor() = default;
+PLOTAID_TEMPLATE_ACTION_LIFETIME(TSetColor)
 
 bool TSetColor::apply() {
     Settings& s = *settings_;
@@ -269,22 +275,12 @@ bool TSetColor::apply() {
 
 // ---- setDash, setShape ----------------------------------------------------------------------------
 
-struct TSetDash::Settings {
+struct TSetDash::Settings : CycleSettings {
     TSetDash& action;
-    std::uint32_t aestheticNumber = 0;
-    const DOMElement* cycle = nullptr;
-
     explicit Settings(TSetDash& owner) : action(owner) {}
-    void read(const DOMElement* instruction) {
-        aestheticNumber = aestheticNumberOf(instruction);
-        cycle = lastChildNamed(instruction, GrxUni::_cycle);
-    }
 };
 
-TSetDash::TSetDash(const GrxVisualization* source, GrxVisualization& target, const DOMElement* instruction)
-    : BaseTemplate(source, target, instruction), settings_(std::make_unique<Settings>(*this)) {}
-
-TSetDash::~TSetDash() = default;
+PLOTAID_TEMPLATE_ACTION_LIFETIME(TSetDash)
 
 bool TSetDash::apply() {
     settings_->read(instruction_);
@@ -293,22 +289,12 @@ bool TSetDash::apply() {
     return true;
 }
 
-struct TSetShape::Settings {
+struct TSetShape::Settings : CycleSettings {
     TSetShape& action;
-    std::uint32_t aestheticNumber = 0;
-    const DOMElement* cycle = nullptr;
-
     explicit Settings(TSetShape& owner) : action(owner) {}
-    void read(const DOMElement* instruction) {
-        aestheticNumber = aestheticNumberOf(instruction);
-        cycle = lastChildNamed(instruction, GrxUni::_cycle);
-    }
 };
 
-TSetShape::TSetShape(const GrxVisualization* source, GrxVisualization& target, const DOMElement* instruction)
-    : BaseTemplate(source, target, instruction), settings_(std::make_unique<Settings>(*this)) {}
-
-TSetShape::~TSetShape() = default;
+PLOTAID_TEMPLATE_ACTION_LIFETIME(TSetShape)
 
 bool TSetShape::apply() {
     settings_->read(instruction_);
@@ -319,23 +305,12 @@ bool TSetShape::apply() {
 
 // ---- setPattern -----------------------------------------------------------------------------------
 
-struct TSetPattern::Settings {
+struct TSetPattern::Settings : CycleSettings {
     TSetPattern& action;
-    std::uint32_t aestheticNumber = 0;
-    const DOMElement* cycle = nullptr;
-
     explicit Settings(TSetPattern& owner) : action(owner) {}
-    void read(const DOMElement* instruction) {
-        aestheticNumber = aestheticNumberOf(instruction);
-        cycle = lastChildNamed(instruction, GrxUni::_cycle);
-    }
 };
 
-TSetPattern::TSetPattern(const GrxVisualization* source, GrxVisualization& target,
-                         const DOMElement* instruction)
-    : BaseTemplate(source, target, instruction), settings_(std::make_unique<Settings>(*this)) {}
-
-TSetPattern::~TSetPattern() = default;
+PLOTAID_TEMPLATE_ACTION_LIFETIME(TSetPattern)
 
 bool TSetPattern::apply() {
     Settings& s = *settings_;
@@ -368,12 +343,10 @@ bool TSetPattern::apply() {
 
 // ---- setSize --------------------------------------------------------------------------------------
 
-struct TSetSize::Settings {
+struct TSetSize::Settings : CycleSettings {
     using Kind = bool (*)(const CTElementType&);
 
     TSetSize& action;
-    std::uint32_t aestheticNumber = 0;
-    const DOMElement* cycle = nullptr;
     std::vector<ChartString> mappingNames;
     std::vector<ChartString> mappingValues;
     Kind kind = nullptr; // null: every element
@@ -387,8 +360,7 @@ struct TSetSize::Settings {
     static bool none(const CTElementType&) { return false; }
 
     void read(const DOMElement* instruction) {
-        aestheticNumber = aestheticNumberOf(instruction);
-        cycle = lastChildNamed(instruction, GrxUni::_cycle);
+        CycleSettings::read(instruction);
         mappingNames.clear();
         mappingValues.clear();
         if (instruction != nullptr)
@@ -423,10 +395,7 @@ struct TSetSize::Settings {
     }
 };
 
-TSetSize::TSetSize(const GrxVisualization* source, GrxVisualization& target, const DOMElement* instruction)
-    : BaseTemplate(source, target, instruction), settings_(std::make_unique<Settings>(*this)) {}
-
-TSetSize::~TSetSize() = default;
+PLOTAID_TEMPLATE_ACTION_LIFETIME(TSetSize)
 
 bool TSetSize::apply() {
     Settings& s = *settings_;
@@ -465,22 +434,12 @@ bool TSetSize::apply() {
 
 // ---- addDash, addImage ----------------------------------------------------------------------------
 
-struct TAddDash::Settings {
+struct TAddDash::Settings : CycleSettings {
     TAddDash& action;
-    std::uint32_t aestheticNumber = 0;
-    const DOMElement* cycle = nullptr;
-
     explicit Settings(TAddDash& owner) : action(owner) {}
-    void read(const DOMElement* instruction) {
-        aestheticNumber = aestheticNumberOf(instruction);
-        cycle = lastChildNamed(instruction, GrxUni::_cycle);
-    }
 };
 
-TAddDash::TAddDash(const GrxVisualization* source, GrxVisualization& target, const DOMElement* instruction)
-    : BaseTemplate(source, target, instruction), settings_(std::make_unique<Settings>(*this)) {}
-
-TAddDash::~TAddDash() = default;
+PLOTAID_TEMPLATE_ACTION_LIFETIME(TAddDash)
 
 bool TAddDash::apply() {
     settings_->read(instruction_);
@@ -489,22 +448,12 @@ bool TAddDash::apply() {
     return true;
 }
 
-struct TAddImage::Settings {
+struct TAddImage::Settings : CycleSettings {
     TAddImage& action;
-    std::uint32_t aestheticNumber = 0;
-    const DOMElement* cycle = nullptr;
-
     explicit Settings(TAddImage& owner) : action(owner) {}
-    void read(const DOMElement* instruction) {
-        aestheticNumber = aestheticNumberOf(instruction);
-        cycle = lastChildNamed(instruction, GrxUni::_cycle);
-    }
 };
 
-TAddImage::TAddImage(const GrxVisualization* source, GrxVisualization& target, const DOMElement* instruction)
-    : BaseTemplate(source, target, instruction), settings_(std::make_unique<Settings>(*this)) {}
-
-TAddImage::~TAddImage() = default;
+PLOTAID_TEMPLATE_ACTION_LIFETIME(TAddImage)
 
 bool TAddImage::apply() {
     settings_->read(instruction_);
@@ -547,11 +496,7 @@ struct TSetGenericAttributes::Settings {
     }
 };
 
-TSetGenericAttributes::TSetGenericAttributes(const GrxVisualization* source, GrxVisualization& target,
-                                             const DOMElement* instruction)
-    : BaseTemplate(source, target, instruction), settings_(std::make_unique<Settings>(*this)) {}
-
-TSetGenericAttributes::~TSetGenericAttributes() = default;
+PLOTAID_TEMPLATE_ACTION_LIFETIME(TSetGenericAttributes)
 
 bool TSetGenericAttributes::apply() {
     Settings& s = *settings_;
@@ -641,11 +586,7 @@ struct TSetShowLineMarkers::Settings {
     }
 };
 
-TSetShowLineMarkers::TSetShowLineMarkers(const GrxVisualization* source, GrxVisualization& target,
-                                         const DOMElement* instruction)
-    : BaseTemplate(source, target, instruction), settings_(std::make_unique<Settings>(*this)) {}
-
-TSetShowLineMarkers::~TSetShowLineMarkers() = default;
+PLOTAID_TEMPLATE_ACTION_LIFETIME(TSetShowLineMarkers)
 
 bool TSetShowLineMarkers::apply() {
     Settings& s = *settings_;
