@@ -13,6 +13,7 @@
 
 #include "BenchSupport.h"
 #include "ScaledChart.h"
+#include "TemplateBench.h"
 
 #include <benchmark/benchmark.h>
 
@@ -36,10 +37,6 @@ constexpr double kScalingLimit = 11.0;
 const std::string kSample = std::string(PLOTAID_EXAMPLES_DIR) + "/charts/scatterplot-matrix.xml";
 const std::string kTemplate = std::string(PLOTAID_EXAMPLES_DIR) + "/templates/presentation.sgt";
 
-ChartException refused(const char* what) {
-    return ChartException(what, "bench/template_apply", 0);
-}
-
 const std::string& scaledChart(long elements) {
     static std::map<long, std::string> charts;
     auto found = charts.find(elements);
@@ -60,38 +57,11 @@ const std::string& presentation() {
 }
 
 void applyPresentation(benchmark::State& state) {
-    const std::string& chart = scaledChart(state.range(0));
-    plotaid::detail::ValidatingParser parser;
-    for (auto _ : state) {
-        if (!parser.parse(chart, "bench", refused("chart"))) {
-            state.SkipWithError("the scaled chart does not validate");
-            return;
-        }
-        plotaid::detail::OwnedDocument doc = parser.adoptDocument();
-        GrxVisualization vis(doc.release()->getDocumentElement(), true);
-        ChartTemplate chartTemplate(vis, nullptr);
-        if (!chartTemplate.setTemplate(presentation())) {
-            state.SkipWithError("the template does not validate");
-            return;
-        }
-        chartTemplate.applyTemplate();
-        benchmark::DoNotOptimize(vis.AsUTF8());
-    }
+    bench::applyTemplateLoop(state, scaledChart(state.range(0)), presentation());
 }
 
 void applyFloor(benchmark::State& state) {
-    const std::string& chart = scaledChart(state.range(0));
-    plotaid::detail::ValidatingParser chartParser, templateParser;
-    for (auto _ : state) {
-        if (!chartParser.parse(chart, "bench", refused("chart")) ||
-            !templateParser.parse(presentation(), "bench", refused("template"))) {
-            state.SkipWithError("the inputs do not validate");
-            return;
-        }
-        plotaid::detail::OwnedDocument doc = chartParser.adoptDocument();
-        GrxVisualization vis(doc.release()->getDocumentElement(), true);
-        benchmark::DoNotOptimize(vis.AsUTF8());
-    }
+    bench::applyTemplateFloorLoop(state, scaledChart(state.range(0)), presentation());
 }
 
 BENCHMARK(applyPresentation)->Arg(kSmall)->Arg(kLarge)->Unit(benchmark::kMillisecond)->Repetitions(3);

@@ -16,6 +16,7 @@
 
 #include "BenchSupport.h"
 #include "ScaledChart.h"
+#include "TemplateBench.h"
 
 #include <benchmark/benchmark.h>
 
@@ -41,10 +42,6 @@ constexpr double kApplyLimit = 3.0;
 constexpr double kUniqueIdLimit = 2.0;
 const std::string kSample = std::string(PLOTAID_EXAMPLES_DIR) + "/charts/scatterplot-matrix.xml";
 
-ChartException refused(const char* what) {
-    return ChartException(what, "bench/template_walk", 0);
-}
-
 const std::string& scaledChart() {
     static const std::string text = bench::scaleChart(kSample, kChartElements);
     return text;
@@ -67,36 +64,11 @@ const std::string& bigTemplate() {
 }
 
 void applyTemplate(benchmark::State& state) {
-    plotaid::detail::ValidatingParser parser;
-    for (auto _ : state) {
-        if (!parser.parse(scaledChart(), "bench", refused("chart"))) {
-            state.SkipWithError("the scaled chart does not validate");
-            return;
-        }
-        plotaid::detail::OwnedDocument doc = parser.adoptDocument();
-        GrxVisualization vis(doc.release()->getDocumentElement(), true);
-        ChartTemplate chartTemplate(vis, nullptr);
-        if (!chartTemplate.setTemplate(bigTemplate())) {
-            state.SkipWithError("the template does not validate");
-            return;
-        }
-        chartTemplate.applyTemplate();
-        benchmark::DoNotOptimize(vis.AsUTF8());
-    }
+    bench::applyTemplateLoop(state, scaledChart(), bigTemplate());
 }
 
 void applyTemplateFloor(benchmark::State& state) {
-    plotaid::detail::ValidatingParser chartParser, templateParser;
-    for (auto _ : state) {
-        if (!chartParser.parse(scaledChart(), "bench", refused("chart")) ||
-            !templateParser.parse(bigTemplate(), "bench", refused("template"))) {
-            state.SkipWithError("the inputs do not validate");
-            return;
-        }
-        plotaid::detail::OwnedDocument doc = chartParser.adoptDocument();
-        GrxVisualization vis(doc.release()->getDocumentElement(), true);
-        benchmark::DoNotOptimize(vis.AsUTF8());
-    }
+    bench::applyTemplateFloorLoop(state, scaledChart(), bigTemplate());
 }
 
 // A visualization with style1 .. style<kStyles> made the way actions make them.
