@@ -7,7 +7,9 @@
 #include <xercesc/framework/MemBufInputSource.hpp>
 #include <xercesc/parsers/XercesDOMParser.hpp>
 
+#include <cstdlib>
 #include <memory>
+#include <sstream>
 #include <string>
 
 using namespace XERCES_CPP_NAMESPACE;
@@ -28,14 +30,15 @@ std::string utf8(const XMLCh* s) {
 
 class FormatImport : public EngineTest {
 protected:
-    void SetUp() override {
+    void SetUp() override { fresh(); }
+    void fresh() {
         chart_ = Chart::empty();
         format_ = &chart_.vis->addSourceVariable().addFormat();
     }
 
-    // A template element written as XML in the template namespace (the parser keeps it alive).
+    // A template element in the template namespace; the parser keeps it alive.
     const DOMElement* element(const std::string& body) {
-        const std::string text = "<?xml version=\"1.0\"?>" + body;
+        const std::string text = "<w xmlns=\"http://plotaid.org/grxml\">" + body + "</w>";
         auto parser = std::make_unique<XercesDOMParser>();
         parser->setDoNamespaces(true);
         MemBufInputSource source(reinterpret_cast<const XMLByte*>(text.data()), text.size(), "format-test");
@@ -44,286 +47,198 @@ protected:
         if (document == nullptr || parser->getErrorCount() != 0)
             return nullptr;
         parsers_.push_back(std::move(parser));
-        return document->getDocumentElement();
-    }
-    const DOMElement* inTemplate(const std::string& tag, const std::string& rest) {
-        return element("<" + tag + " xmlns=\"http://plotaid.org/grxml\" " + rest + "</" + tag + ">");
-    }
-    const DOMElement* numberFormat(const std::string& attributes) {
-        return inTemplate("numberFormat", attributes + ">");
-    }
-    const DOMElement* dateTime(const std::string& content) {
-        return inTemplate("dateTimeFormat", ">" + content);
+        return document->getDocumentElement()->getFirstElementChild();
     }
 
-    Probe probe() { return Probe(nullptr, *chart_.vis, nullptr); }
-    std::string attribute(const XMLCh* name) const { return utf8(format_->GetAttribute(name)); }
+    // Imports the element through the operation its tag names.
+    // Date and time parts alone stand for a date-time format of them.
+    void import(const std::string& body) {
+        const bool parts = body.rfind("<dateFormat", 0) == 0 || body.rfind("<timeFormat", 0) == 0;
+        const DOMElement* e = element(parts ? "<dateTimeFormat>" + body + "</dateTimeFormat>" : body);
+        ASSERT_NE(e, nullptr) << body;
+        const std::string tag = utf8(e->getLocalName());
+        Probe probe(nullptr, *chart_.vis, nullptr);
+        if (tag == "numberFormat")
+            probe.importNumberFormat(*format_, e);
+        else if (tag == "stringFormat")
+            probe.importStringFormat(*format_, e);
+        else if (tag == "elapsedTimeFormat")
+            probe.importElapsedTimeFormat(*format_, e);
+        else if (tag == "dateTimeFormat")
+            probe.importDateTimeFormat(*format_, e);
+        else
+            BaseTemplate::importFormat(*format_, e);
+    }
+
+    // "name=value ..." written straight onto the format.
+    void preset(const std::string& pairs) {
+        std::istringstream in(pairs);
+        for (std::string pair; in >> pair;) {
+            const std::string::size_type eq = pair.find('=');
+            format_->SetAttribute(ChartString(pair.substr(0, eq)).xc_str(),
+                                  ChartString(pair.substr(eq + 1)).xc_str());
+        }
+    }
+
+    // The format's values of the names in `expected` ("name=value ...", "-" for absent), numbers
+    // compared as numbers.
+    std::string state(const std::string& expected) const {
+        std::istringstream in(expected);
+        std::string out;
+        for (std::string pair; in >> pair;) {
+            const std::string name = pair.substr(0, pair.find('='));
+            const XMLCh* raw = format_->GetAttribute(ChartString(name).xc_str());
+            std::string value = format_->isAttributePresent(ChartString(name).xc_str()) ? utf8(raw) : "-";
+            char* end = nullptr;
+            const double number = std::strtod(value.c_str(), &end);
+            if (!value.empty() && *end == '\0') {
+                std::ostringstream n;
+                n << number;
+                value = n.str();
+            }
+            out += (out.empty() ? "" : " ") + name + "=" + value;
+        }
+        return out;
+    }
 
     Chart chart_;
     GrxFormat* format_ = nullptr;
     std::vector<std::unique_ptr<XercesDOMParser>> parsers_;
 };
 
-TEST_F(FormatImport, GroupingGoesOffWhenAbsentButHidingNegativesStays) {
-    format_->setUseGrouping(true);
-    format_->setHideNegatives(true);
-    format_->setNegativesOutside(true);
-    format_->setNegativesInParentheses(true);
-    const DOMElement* e = numberFormat("maximumFractionDigits=\"2\"");
-    ASSERT_NE(e, nullptr);
-    probe().importNumberFormat(*format_, e);
-    EXPECT_FALSE(format_->getUseGrouping());
-    EXPECT_TRUE(format_->getHideNegatives());
-    EXPECT_FALSE(format_->getNegativesOutside());
-    EXPECT_FALSE(format_->getNegativesInParentheses());
-    EXPECT_EQ(format_->getMaximumFractionDigits(), 2);
-
-    // Any other non-empty word switches hiding off; "true" switches the three on.
-    probe().importNumberFormat(*format_, numberFormat("hideNegatives=\"yes\" useGrouping=\"true\""));
-    EXPECT_FALSE(format_->getHideNegatives());
-    EXPECT_TRUE(format_->getUseGrouping());
-    probe().importNumberFormat(*format_,
-                               numberFormat("hideNegatives=\"true\" negativesOutside=\"true\" "
-                                            "negativesInParentheses=\"true\" useGrouping=\"TRUE\""));
-    EXPECT_TRUE(format_->getHideNegatives());
-    EXPECT_TRUE(format_->getNegativesOutside());
-    EXPECT_TRUE(format_->getNegativesInParentheses());
-    EXPECT_FALSE(format_->getUseGrouping()); // the comparison is exact
-}
-
-TEST_F(FormatImport, ScientificWordsPairUpAndOthersChangeNothing) {
+TEST_F(FormatImport, EachFormatKindSetsWhatItNamesAndClearsWhatItMustOnly) {
     const struct {
-        const char* word;
-        int mode;
-    } cases[] = {{"always", 1}, {"true", 1}, {"never", 2}, {"false", 2}};
+        std::string preset;
+        std::string element;
+        std::string expected;
+    } cases[] = {
+        // Grouping and the negative placements go off when absent; hiding negatives stays.
+        {"useGrouping=true hideNegatives=true negativesOutside=true negativesInParentheses=true",
+         "<numberFormat maximumFractionDigits='2'/>",
+         "useGrouping=false hideNegatives=true negativesOutside=false negativesInParentheses=false "
+         "maximumFractionDigits=2"},
+        {"hideNegatives=true", "<numberFormat hideNegatives='yes' useGrouping='true'/>",
+         "hideNegatives=false useGrouping=true"},
+        {"", // the comparison with "true" is exact
+         "<numberFormat hideNegatives='true' negativesOutside='true' negativesInParentheses='true' "
+         "useGrouping='TRUE'/>",
+         "hideNegatives=true negativesOutside=true negativesInParentheses=true useGrouping=false"},
+        {"scientific=4", "<numberFormat scientific='always'/>", "scientific=1"},
+        {"scientific=4", "<numberFormat scientific='true'/>", "scientific=1"},
+        {"scientific=4", "<numberFormat scientific='never'/>", "scientific=2"},
+        {"scientific=4", "<numberFormat scientific='false'/>", "scientific=2"},
+        {"scientific=4", "<numberFormat scientific='sometimes'/>", "scientific=4"},
+        {"scientific=4", "<numberFormat scientific=''/>", "scientific=4"},
+        {"scientific=4", "<numberFormat scientific='Always'/>", "scientific=4"},
+        // Digits and scaling only when given and not empty.
+        {"minimumFractionDigits=1 maximumFractionDigits=5 minimumIntegerDigits=2 maximumIntegerDigits=9 "
+         "scalingFactor=100",
+         "<numberFormat minimumFractionDigits='' maximumFractionDigits='3'/>",
+         "minimumFractionDigits=1 maximumFractionDigits=3 minimumIntegerDigits=2 maximumIntegerDigits=9 "
+         "scalingFactor=100"},
+        {"minimumFractionDigits=1",
+         "<numberFormat minimumFractionDigits='0' minimumIntegerDigits='4' maximumIntegerDigits='7' "
+         "scalingFactor='0.001'/>",
+         "minimumFractionDigits=0 minimumIntegerDigits=4 maximumIntegerDigits=7 scalingFactor=0.001"},
+        // Affixes: an empty or absent one removes what the format had; the other kinds touch nothing
+        // else.
+        {"prefix=$ suffix=USD", "<numberFormat prefix='' suffix='EUR'/>", "prefix=- suffix=EUR"},
+        {"useGrouping=true", "<stringFormat prefix='(' suffix=')'/>", "prefix=( suffix=) useGrouping=true"},
+        {"prefix=( useGrouping=true", "<elapsedTimeFormat suffix='h'/>",
+         "prefix=- suffix=h useGrouping=true"},
+        {"prefix=( suffix=h useGrouping=true", "<dateTimeFormat/>",
+         "prefix=- suffix=- baseFormat=- useGrouping=true"},
+        // The base format follows the kinds of parts present at any depth.
+        {"", "<dateFormat/><timeFormat/>", "baseFormat=3"},
+        {"baseFormat=3", "<dateFormat/>", "baseFormat=1"},
+        {"", "<timeFormat/>", "baseFormat=2"},
+        {"", "<dateTimeFormat><other><timeFormat/></other><dateFormat/></dateTimeFormat>", "baseFormat=3"},
+        {"baseFormat=3", "<dateTimeFormat><other/></dateTimeFormat>", "baseFormat=3"},
+        // Only the first date format is read.
+        {"",
+         "<dateFormat><year showCentury='true'/></dateFormat><timeFormat><minute/>"
+         "</timeFormat><dateFormat><month fill='true'/><era/></dateFormat>",
+         "baseFormat=3 showYear=true yearAbbreviation=false showMinute=true showMonth=- monthFormat=- "
+         "showEra=-"},
+        {"",
+         "<dateFormat><dayOfWeek long='true'/><dayOfMonth fill='true'/>"
+         "<week fill='false'/><month fill='true'/><quarter prefix='Q' suffix=''/>"
+         "<year showCentury='false'/><era/></dateFormat>",
+         "showDayOfWeek=true dayOfWeekAbbreviation=false showDay=true dayType=1 dayPadding=true "
+         "showWeek=true "
+         "weekPadding=false showMonth=true monthFormat=4 showQuarter=true quarterPrefix=Q quarterSuffix=- "
+         "showYear=true yearAbbreviation=true showEra=true"},
+        // The day of the year wins over the day of the month; a month name over a month.
+        {"dayPadding=true monthFormat=4",
+         "<dateFormat><dayOfYear fill='false'/><dayOfMonth/><monthName long='false'/>"
+         "<month fill='false'/><dayOfWeek long='false'/></dateFormat>",
+         "dayType=2 dayPadding=false monthFormat=1 dayOfWeekAbbreviation=true"},
+        {"", "<dateFormat><monthName long='true'/></dateFormat>", "monthFormat=2"},
+        // Parts not named stay; a fill other than true or false leaves the padding.
+        {"showYear=true showSecond=true dayPadding=true monthFormat=2",
+         "<dateFormat><dayOfMonth fill='maybe'/><month/></dateFormat>",
+         "showYear=true showSecond=true dayPadding=true monthFormat=2 showMonth=true"},
+        // The hour format from 24 hours and AM/PM, in any attribute order.
+        {"hourFormat=0", "<timeFormat><hour twentyFour='true' showAMPM='true'/></timeFormat>",
+         "hourFormat=1 showHour=true"},
+        {"hourFormat=0", "<timeFormat><hour showAMPM='true' twentyFour='true'/></timeFormat>",
+         "hourFormat=1 showHour=true"},
+        {"hourFormat=0", "<timeFormat><hour twentyFour='true' showAMPM='false'/></timeFormat>",
+         "hourFormat=2 showHour=true"},
+        {"hourFormat=0", "<timeFormat><hour twentyFour='false'/></timeFormat>", "hourFormat=3 showHour=true"},
+        {"hourFormat=2", "<timeFormat><hour showAMPM='false'/></timeFormat>", "hourFormat=2 showHour=true"},
+        {"hourFormat=3", "<timeFormat><hour twentyFour='yes'/></timeFormat>", "hourFormat=3 showHour=true"},
+        {"",
+         "<timeFormat><hour fill='true'/><minute fill='true'/>"
+         "<second fill='false' milliseconds='true'/></timeFormat>",
+         "hourPadding=true showMinute=true minutePadding=true showSecond=true secondPadding=false "
+         "showMilliseconds=true hourFormat=-"},
+        {"hourPadding=true showMilliseconds=true minutePadding=true",
+         "<timeFormat><second milliseconds='false'/><minute fill='false'/></timeFormat>",
+         "showMilliseconds=false minutePadding=false hourPadding=true"},
+    };
     for (const auto& c : cases) {
-        format_->setScientific(4);
-        probe().importNumberFormat(*format_, numberFormat(std::string("scientific=\"") + c.word + "\""));
-        EXPECT_EQ(format_->getScientific(), c.mode) << c.word;
+        SCOPED_TRACE(c.element);
+        fresh();
+        preset(c.preset);
+        import(c.element);
+        EXPECT_EQ(state(c.expected), c.expected);
     }
-    for (const char* word : {"sometimes", "", "Always"}) {
-        format_->setScientific(4);
-        probe().importNumberFormat(*format_, numberFormat(std::string("scientific=\"") + word + "\""));
-        EXPECT_EQ(format_->getScientific(), 4) << word;
-    }
-}
-
-TEST_F(FormatImport, DigitsAndScalingAreSetOnlyWhenGiven) {
-    format_->setMinimumFractionDigits(1);
-    format_->setMaximumFractionDigits(5);
-    format_->setMinimumIntegerDigits(2);
-    format_->setMaximumIntegerDigits(9);
-    format_->setScalingFactor(100.0);
-    probe().importNumberFormat(*format_,
-                               numberFormat("minimumFractionDigits=\"\" maximumFractionDigits=\"3\""));
-    EXPECT_EQ(format_->getMinimumFractionDigits(), 1);
-    EXPECT_EQ(format_->getMaximumFractionDigits(), 3);
-    EXPECT_EQ(format_->getMinimumIntegerDigits(), 2);
-    EXPECT_EQ(format_->getMaximumIntegerDigits(), 9);
-    EXPECT_DOUBLE_EQ(format_->getScalingFactor(), 100.0);
-
-    probe().importNumberFormat(*format_,
-                               numberFormat("minimumFractionDigits=\"0\" minimumIntegerDigits=\"4\" "
-                                            "maximumIntegerDigits=\"7\" scalingFactor=\"0.001\""));
-    EXPECT_EQ(format_->getMinimumFractionDigits(), 0);
-    EXPECT_EQ(format_->getMinimumIntegerDigits(), 4);
-    EXPECT_EQ(format_->getMaximumIntegerDigits(), 7);
-    EXPECT_DOUBLE_EQ(format_->getScalingFactor(), 0.001);
-}
-
-TEST_F(FormatImport, AnEmptyPrefixRemovesWhatTheFormatHad) {
-    format_->setPrefix(u"$");
-    format_->setSuffix(u" USD");
-    probe().importNumberFormat(*format_, numberFormat("prefix=\"\" suffix=\" EUR\""));
-    EXPECT_FALSE(format_->isPrefixPresent());
-    EXPECT_EQ(attribute(GrxUni::_suffix), " EUR");
-
-    // The string, elapsed-time and date-time formats treat the affixes alike, and nothing else.
-    format_->setUseGrouping(true);
-    probe().importStringFormat(*format_, inTemplate("stringFormat", "prefix=\"(\" suffix=\")\">"));
-    EXPECT_EQ(attribute(GrxUni::_prefix), "(");
-    EXPECT_EQ(attribute(GrxUni::_suffix), ")");
-    EXPECT_TRUE(format_->getUseGrouping());
-    probe().importElapsedTimeFormat(*format_, inTemplate("elapsedTimeFormat", "suffix=\" h\">"));
-    EXPECT_FALSE(format_->isPrefixPresent());
-    EXPECT_EQ(attribute(GrxUni::_suffix), " h");
-    probe().importDateTimeFormat(*format_, dateTime(""));
-    EXPECT_FALSE(format_->isPrefixPresent());
-    EXPECT_FALSE(format_->isSuffixPresent());
-    EXPECT_FALSE(format_->isBaseFormatPresent()); // neither a date nor a time part
-    EXPECT_TRUE(format_->getUseGrouping());
 }
 
 TEST_F(FormatImport, NullElementsChangeNothing) {
-    format_->setPrefix(u"$");
-    format_->setUseGrouping(true);
-    Probe p = probe();
+    preset("prefix=$ useGrouping=true");
+    Probe p(nullptr, *chart_.vis, nullptr);
     BaseTemplate::importFormat(*format_, nullptr);
     p.importNumberFormat(*format_, nullptr);
     p.importStringFormat(*format_, nullptr);
     p.importDateTimeFormat(*format_, nullptr);
     p.importElapsedTimeFormat(*format_, nullptr);
-    EXPECT_EQ(attribute(GrxUni::_prefix), "$");
-    EXPECT_TRUE(format_->getUseGrouping());
+    EXPECT_EQ(state("prefix=$ useGrouping=true"), "prefix=$ useGrouping=true");
     EXPECT_EQ(format_->getImplementation()->getAttributes()->getLength(), 2u);
 }
 
-TEST_F(FormatImport, BaseFormatFollowsTheKindsOfPartsPresent) {
-    probe().importDateTimeFormat(*format_, dateTime("<dateFormat/><timeFormat/>"));
-    EXPECT_EQ(format_->getBaseFormat(), 3);
-    probe().importDateTimeFormat(*format_, dateTime("<dateFormat/>"));
-    EXPECT_EQ(format_->getBaseFormat(), 1);
-    probe().importDateTimeFormat(*format_, dateTime("<timeFormat/>"));
-    EXPECT_EQ(format_->getBaseFormat(), 2);
-    probe().importDateTimeFormat(*format_, dateTime("<other><timeFormat/></other><dateFormat/>"));
-    EXPECT_EQ(format_->getBaseFormat(), 3); // descendants at any depth count
-    probe().importDateTimeFormat(*format_, dateTime("<other/>"));
-    EXPECT_EQ(format_->getBaseFormat(), 3);
-}
-
-TEST_F(FormatImport, OnlyTheFirstDateFormatIsRead) {
-    probe().importDateTimeFormat(*format_, dateTime("<dateFormat><year showCentury=\"true\"/></dateFormat>"
-                                                    "<timeFormat><minute/></timeFormat>"
-                                                    "<dateFormat><month fill=\"true\"/><era/></dateFormat>"));
-    EXPECT_EQ(format_->getBaseFormat(), 3);
-    EXPECT_TRUE(format_->getShowYear());
-    EXPECT_FALSE(format_->getYearAbbreviation());
-    EXPECT_TRUE(format_->getShowMinute());
-    EXPECT_FALSE(format_->isShowMonthPresent());
-    EXPECT_FALSE(format_->isMonthFormatPresent());
-    EXPECT_FALSE(format_->isShowEraPresent());
-}
-
-TEST_F(FormatImport, DatePartsSwitchOnAndReadTheirAttributes) {
-    probe().importDateTimeFormat(*format_,
-                                 dateTime("<dateFormat><dayOfWeek long=\"true\"/>"
-                                          "<dayOfMonth fill=\"true\"/><week fill=\"false\"/>"
-                                          "<month fill=\"true\"/>"
-                                          "<quarter prefix=\"Q\" suffix=\"\"/><year showCentury=\"false\"/>"
-                                          "<era/></dateFormat>"));
-    EXPECT_TRUE(format_->getShowDayOfWeek());
-    EXPECT_FALSE(format_->getDayOfWeekAbbreviation());
-    EXPECT_TRUE(format_->getShowDay());
-    EXPECT_EQ(format_->getDayType(), 1);
-    EXPECT_TRUE(format_->getDayPadding());
-    EXPECT_TRUE(format_->getShowWeek());
-    EXPECT_FALSE(format_->getWeekPadding());
-    EXPECT_TRUE(format_->isWeekPaddingPresent());
-    EXPECT_TRUE(format_->getShowMonth());
-    EXPECT_EQ(format_->getMonthFormat(), 4);
-    EXPECT_TRUE(format_->getShowQuarter());
-    EXPECT_EQ(utf8(format_->getQuarterPrefix()), "Q");
-    EXPECT_FALSE(format_->isQuarterSuffixPresent());
-    EXPECT_TRUE(format_->getShowYear());
-    EXPECT_TRUE(format_->getYearAbbreviation());
-    EXPECT_TRUE(format_->getShowEra());
-
-    // The day of the year comes after the day of the month and wins; a month name after a month.
-    probe().importDateTimeFormat(*format_, dateTime("<dateFormat><dayOfYear fill=\"false\"/>"
-                                                    "<dayOfMonth/><monthName long=\"false\"/>"
-                                                    "<month fill=\"false\"/><dayOfWeek long=\"false\"/>"
-                                                    "</dateFormat>"));
-    EXPECT_EQ(format_->getDayType(), 2);
-    EXPECT_FALSE(format_->getDayPadding());
-    EXPECT_EQ(format_->getMonthFormat(), 1);
-    EXPECT_TRUE(format_->getDayOfWeekAbbreviation());
-    probe().importDateTimeFormat(*format_, dateTime("<dateFormat><monthName long=\"true\"/></dateFormat>"));
-    EXPECT_EQ(format_->getMonthFormat(), 2);
-}
-
-TEST_F(FormatImport, PartsNotNamedStayAsTheyWere) {
-    format_->setShowYear(true);
-    format_->setShowSecond(true);
-    format_->setDayPadding(true);
-    format_->setMonthFormat(2);
-    probe().importDateTimeFormat(*format_, dateTime("<dateFormat><dayOfMonth fill=\"maybe\"/>"
-                                                    "<month/></dateFormat>"));
-    EXPECT_TRUE(format_->getShowYear());
-    EXPECT_TRUE(format_->getShowSecond());
-    EXPECT_TRUE(format_->getDayPadding()); // a word other than true or false leaves it
-    EXPECT_EQ(format_->getMonthFormat(), 2);
-    EXPECT_TRUE(format_->getShowMonth());
-}
-
-TEST_F(FormatImport, HourFormatFromTwentyFourAndAmPm) {
-    const struct {
-        const char* attributes;
-        int preset;
-        int hourFormat;
-    } cases[] = {
-        {"twentyFour=\"true\" showAMPM=\"true\"", 0, 1},
-        {"showAMPM=\"true\" twentyFour=\"true\"", 0, 1}, // attribute order in the text does not matter
-        {"twentyFour=\"true\" showAMPM=\"false\"", 0, 2},
-        {"twentyFour=\"false\"", 0, 3},
-        {"showAMPM=\"false\"", 2, 2},
-        {"twentyFour=\"yes\"", 3, 3},
-    };
-    for (const auto& c : cases) {
-        format_->setHourFormat(c.preset);
-        probe().importDateTimeFormat(
-            *format_, dateTime(std::string("<timeFormat><hour ") + c.attributes + "/></timeFormat>"));
-        EXPECT_EQ(format_->getHourFormat(), c.hourFormat) << c.attributes;
-        EXPECT_TRUE(format_->getShowHour());
-    }
-}
-
-TEST_F(FormatImport, TimePartsAndTheirPadding) {
-    probe().importDateTimeFormat(*format_,
-                                 dateTime("<timeFormat><hour fill=\"true\"/><minute fill=\"true\"/>"
-                                          "<second fill=\"false\" milliseconds=\"true\"/></timeFormat>"));
-    EXPECT_TRUE(format_->getHourPadding());
-    EXPECT_TRUE(format_->getShowMinute());
-    EXPECT_TRUE(format_->getMinutePadding());
-    EXPECT_TRUE(format_->getShowSecond());
-    EXPECT_FALSE(format_->getSecondPadding());
-    EXPECT_TRUE(format_->getShowMilliseconds());
-    EXPECT_FALSE(format_->isHourFormatPresent());
-    probe().importDateTimeFormat(*format_, dateTime("<timeFormat><second milliseconds=\"false\"/>"
-                                                    "<minute fill=\"false\"/></timeFormat>"));
-    EXPECT_FALSE(format_->getShowMilliseconds());
-    EXPECT_FALSE(format_->getMinutePadding());
-    EXPECT_TRUE(format_->getHourPadding());
-}
-
-TEST_F(FormatImport, FormatReplacesEveryAttributeAndKeepsOneUnitRule) {
-    format_->setPrefix(u"$");
-    format_->setUseGrouping(true);
-    format_->setBaseFormat(3);
-    GrxUnitRule& old = format_->addUnitRule();
-    old.setSuffix(u"old");
-    const DOMElement* e = inTemplate("format", "suffix=\"%\" maximumFractionDigits=\"1\">"
-                                               "<unitRule min=\"1000\" scale=\"0.001\" suffix=\"K\"/>"
-                                               "<unitRule min=\"1000000\" scale=\"0.000001\" suffix=\"M\"/>");
-    ASSERT_NE(e, nullptr);
-    BaseTemplate::importFormat(*format_, e);
+TEST_F(FormatImport, FormatReplacesEveryAttributeKeepsOneUnitRuleAndNoTakenId) {
+    preset("prefix=$ useGrouping=true baseFormat=3");
+    format_->addUnitRule().setSuffix(u"old");
+    import("<format suffix='%' maximumFractionDigits='1'><unitRule min='1000' scale='0.001' suffix='K'/>"
+           "<unitRule min='1000000' scale='0.000001' suffix='M'/></format>");
     EXPECT_EQ(format_->getImplementation()->getAttributes()->getLength(), 2u);
-    EXPECT_FALSE(format_->isPrefixPresent());
-    EXPECT_FALSE(format_->isUseGroupingPresent());
-    EXPECT_FALSE(format_->isBaseFormatPresent());
-    EXPECT_EQ(attribute(GrxUni::_suffix), "%");
-    EXPECT_EQ(format_->getMaximumFractionDigits(), 1);
+    EXPECT_EQ(state("suffix=% maximumFractionDigits=1"), "suffix=% maximumFractionDigits=1");
     const std::vector<GrxUnitRule*> rules = format_->getUnitRules();
     ASSERT_EQ(rules.size(), 1u);
     EXPECT_EQ(utf8(rules[0]->getSuffix()), "K");
     EXPECT_DOUBLE_EQ(rules[0]->getMin(), 1000.0);
     EXPECT_DOUBLE_EQ(rules[0]->getScale(), 0.001);
 
-    // Without unit rules in the template the format keeps none.
-    BaseTemplate::importFormat(*format_, inTemplate("format", "prefix=\"#\">"));
-    EXPECT_TRUE(format_->getUnitRules().empty());
-    EXPECT_EQ(attribute(GrxUni::_prefix), "#");
-    EXPECT_FALSE(format_->isSuffixPresent());
-}
-
-TEST_F(FormatImport, AFormatIdTakenElsewhereIsNotCopied) {
+    // Without unit rules in the template the format keeps none; an id taken elsewhere stays there.
     GrxSourceVariable& other = chart_.vis->addSourceVariable();
     other.setId(u"taken");
-    BaseTemplate::importFormat(*format_, inTemplate("format", "id=\"taken\" prefix=\"$\">"));
+    import("<format id='taken' prefix='#'/>");
+    EXPECT_TRUE(format_->getUnitRules().empty());
+    EXPECT_EQ(state("prefix=# suffix=- id=-"), "prefix=# suffix=- id=-");
     EXPECT_EQ(chart_.vis->getElementById(u"taken"), other.getImplementation());
-    EXPECT_FALSE(format_->isIdPresent());
-    EXPECT_EQ(attribute(GrxUni::_prefix), "$");
-
-    BaseTemplate::importFormat(*format_, inTemplate("format", "id=\"fresh\">"));
+    import("<format id='fresh'/>");
     EXPECT_EQ(chart_.vis->getElementById(u"fresh"), format_->getImplementation());
 }
 
