@@ -1,17 +1,9 @@
 #include "AestheticsSupport.h"
 
-#include "support/GrammarSupport.h"
-
-#include "foundation/ValidatingParser.h"
-
 #include <plotaid/ChartException.h>
 #include <plotaid/ChartTemplate.h>
 
-#include <grx/GrxUni.h>
-
-#include <xercesc/dom/DOM.hpp>
-
-#include <algorithm>
+#include <map>
 #include <set>
 
 using namespace XERCES_CPP_NAMESPACE;
@@ -19,19 +11,6 @@ using namespace XERCES_CPP_NAMESPACE;
 namespace aesthetics_test {
 
 namespace {
-
-const std::string kHead = "<?xml version=\"1.0\" encoding=\"UTF-8\"?>\n"
-                          "<template xmlns=\"http://plotaid.org/grxml\" "
-                          "xmlns:xsi=\"http://www.w3.org/2001/XMLSchema-instance\" "
-                          "xsi:schemaLocation=\"http://plotaid.org/grxml "
-                          "http://plotaid.org/grxml/grxml-template-3.5.xsd\">";
-
-const DOMElement* firstElementChild(const DOMNode* node) {
-    for (const DOMNode* n = node->getFirstChild(); n != nullptr; n = n->getNextSibling())
-        if (n->getNodeType() == DOMNode::ELEMENT_NODE)
-            return static_cast<const DOMElement*>(n);
-    return nullptr;
-}
 
 std::map<std::string, std::string> attributesOf(const DOMElement* e, bool withId) {
     std::map<std::string, std::string> out;
@@ -86,24 +65,21 @@ void writeCanonical(const DOMElement* e, const DOMDocument* document, std::strin
     }
 }
 
+const GrxStyleCycle* cycleOf(const GrxVisualization& chart, const std::string& aestheticId) {
+    const CTAesthetic* aesthetic = byId<CTAesthetic>(chart, aestheticId);
+    return aesthetic != nullptr ? aesthetic->getCycle() : nullptr;
+}
+
 } // namespace
 
 std::string templateOf(const std::string& body) {
-    return kHead + body + "</template>";
+    return "<?xml version=\"1.0\" encoding=\"UTF-8\"?>\n"
+           "<template xmlns=\"http://plotaid.org/grxml\" "
+           "xmlns:xsi=\"http://www.w3.org/2001/XMLSchema-instance\" "
+           "xsi:schemaLocation=\"http://plotaid.org/grxml "
+           "http://plotaid.org/grxml/grxml-template-3.5.xsd\">" +
+           body + "</template>";
 }
-
-struct Instruction::Holder {
-    plotaid::detail::ValidatingParser parser;
-};
-
-Instruction::Instruction(const std::string& instructionXml) : holder_(std::make_unique<Holder>()) {
-    DOMDocument* document = holder_->parser.parse(templateOf(instructionXml), "instruction",
-                                                  ChartException("test template", "aesthetics_test", 0));
-    if (document != nullptr)
-        element_ = firstElementChild(document->getDocumentElement());
-}
-
-Instruction::~Instruction() = default;
 
 std::vector<plotaid::detail::InstructionOutcome>
 applyTemplate(GrxVisualization& target, const std::string& body, GrxVisualization* source) {
@@ -162,54 +138,14 @@ std::string attribute(const GrxBaseElement& element, const std::string& name) {
     return text(element.GetAttribute(ChartString(name).xc_str()));
 }
 
-std::vector<std::map<std::string, std::string>> cycleStyles(const GrxStyleCycle& styleCycle) {
-    std::vector<std::map<std::string, std::string>> out;
-    const std::vector<GrxCycle*> cycles = styleCycle.getCycles();
-    if (cycles.empty())
-        return out;
-    for (const GrxStyle* style : cycles.front()->getStyles())
-        out.push_back(attributesOf(style->getImplementation(), false));
-    return out;
-}
-
 std::string cycleIdOf(const GrxVisualization& chart, const std::string& aestheticId) {
-    const CTAesthetic* aesthetic = byId<CTAesthetic>(chart, aestheticId);
-    const GrxStyleCycle* cycle = aesthetic != nullptr ? aesthetic->getCycle() : nullptr;
+    const GrxStyleCycle* cycle = cycleOf(chart, aestheticId);
     return cycle != nullptr ? text(cycle->getId()) : std::string();
 }
 
-std::vector<std::map<std::string, std::string>> cycleStylesOf(const GrxVisualization& chart,
-                                                              const std::string& aestheticId) {
-    const CTAesthetic* aesthetic = byId<CTAesthetic>(chart, aestheticId);
-    const GrxStyleCycle* cycle = aesthetic != nullptr ? aesthetic->getCycle() : nullptr;
-    return cycle != nullptr ? cycleStyles(*cycle) : std::vector<std::map<std::string, std::string>>();
-}
-
-std::string xercesProblems(const GrxVisualization& chart) {
-    plotaid::detail::ValidatingParser parser;
-    const std::string written = chart.AsUTF8();
-    if (parser.parse(written, "written chart", ChartException("written chart", "aesthetics_test", 0)) !=
-        nullptr)
-        return std::string();
-    std::string out;
-    for (const std::string& e : parser.lastErrors())
-        out += e + "\n";
-    return out.empty() ? std::string("refused") : out;
-}
-
-std::string xmllintProblems(const GrxVisualization& chart, bool* skipped) {
-    if (skipped != nullptr)
-        *skipped = false;
-    if (!grammar_test::haveXmllint()) {
-        if (skipped != nullptr)
-            *skipped = true;
-        return std::string();
-    }
-    static int serial = 0;
-    const std::string file =
-        grammar_test::writeScratch("chart" + std::to_string(++serial) + ".xml", chart.AsUTF8());
-    const grammar_test::LintResult r = grammar_test::xmllint("grxml-2.9.xsd", file);
-    return r.exitCode == 0 ? std::string() : r.output;
+std::string stylesOf(const GrxVisualization& chart, const std::string& aestheticId) {
+    const GrxStyleCycle* cycle = cycleOf(chart, aestheticId);
+    return cycle != nullptr ? describeStyles(cycle->getImplementation()) : std::string();
 }
 
 } // namespace aesthetics_test

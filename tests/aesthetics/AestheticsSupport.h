@@ -5,21 +5,19 @@
 // a whole template through the walk, and what "the same chart" means once cycles are renewed.
 
 #include "support/EngineSupport.h"
+#include "support/GrammarSupport.h"
 
+#include "foundation/ValidatingParser.h"
 #include "templates/InstructionWalk.h"
+
+#include <plotaid/ChartException.h>
 
 #include <grx/GrxModel.h>
 
-#include <xercesc/util/XercesDefs.hpp>
+#include <xercesc/dom/DOM.hpp>
 
-#include <map>
-#include <memory>
 #include <string>
 #include <vector>
-
-XERCES_CPP_NAMESPACE_BEGIN
-class DOMElement;
-XERCES_CPP_NAMESPACE_END
 
 namespace aesthetics_test {
 
@@ -28,28 +26,17 @@ using engine_test::Chart;
 // A template of the current form around `body`.
 std::string templateOf(const std::string& body);
 
-// The first instruction of a template, parsed and validated; the document lives with this object.
-class Instruction {
-public:
-    explicit Instruction(const std::string& instructionXml);
-    ~Instruction();
-    Instruction(const Instruction&) = delete;
-    Instruction& operator=(const Instruction&) = delete;
-    const XERCES_CPP_NAMESPACE::DOMElement* element() const { return element_; }
-
-private:
-    struct Holder;
-    std::unique_ptr<Holder> holder_;
-    const XERCES_CPP_NAMESPACE::DOMElement* element_ = nullptr;
-};
-
-// Makes the action T over the chart and applies it once.
+// Makes the action T of the template's first instruction over the chart and applies it once.
 template <class T>
 bool applyAction(const std::string& instructionXml, GrxVisualization& target,
                  const GrxVisualization* source = nullptr) {
-    Instruction instruction(instructionXml);
-    EXPECT_NE(instruction.element(), nullptr) << instructionXml;
-    T action(source, target, instruction.element());
+    plotaid::detail::ValidatingParser parser;
+    const XERCES_CPP_NAMESPACE::DOMDocument* document =
+        parser.parse(templateOf(instructionXml), "instruction", ChartException("test template", "test", 0));
+    EXPECT_NE(document, nullptr) << instructionXml;
+    if (document == nullptr)
+        return false;
+    T action(source, target, document->getDocumentElement()->getFirstElementChild());
     return action.apply();
 }
 
@@ -57,7 +44,8 @@ bool applyAction(const std::string& instructionXml, GrxVisualization& target,
 std::vector<plotaid::detail::InstructionOutcome>
 applyTemplate(GrxVisualization& target, const std::string& body, GrxVisualization* source = nullptr);
 
-// A chart text built around a graph body: variables, domains and a style cycle to refer to.
+// A chart text built around a graph body: variables, domains and a style cycle "chartCycle" of
+// red and blue to refer to.
 std::string chartWith(const std::string& graphBody, const std::string& extra = std::string());
 
 // The chart with every style cycle folded into the aesthetics that use it: each `cycle`
@@ -66,7 +54,7 @@ std::string chartWith(const std::string& graphBody, const std::string& extra = s
 // cycles nothing refers to any more, read the same.
 std::string canonical(const GrxVisualization& chart);
 
-// Style cycles that no `cycle` attribute of the chart refers to.
+// Style cycles that no attribute of the chart refers to.
 std::size_t orphanedStyleCycles(const GrxVisualization& chart);
 
 // The element of that id, wrapped as T; null when absent or of another kind.
@@ -74,23 +62,13 @@ template <class T> T* byId(const GrxVisualization& chart, const std::string& id)
     return GrxBaseElement::wrapperOf<T>(chart.getElementById(ChartString(id)));
 }
 
-// The id of the style cycle that the aesthetic of that id uses, and that cycle's styles; empty
-// when there is no such aesthetic or it has no cycle.
+// The id of the style cycle that the aesthetic of that id uses; empty when there is none.
 std::string cycleIdOf(const GrxVisualization& chart, const std::string& aestheticId);
-std::vector<std::map<std::string, std::string>> cycleStylesOf(const GrxVisualization& chart,
-                                                              const std::string& aestheticId);
+// That cycle's styles as "[({name=value;...}...)...]", ids left out; empty when there is none.
+std::string stylesOf(const GrxVisualization& chart, const std::string& aestheticId);
 
 std::string text(const XMLCh* value);
 std::string attribute(const GrxBaseElement& element, const std::string& name);
-
-// The styles of the (first) cycle of a style cycle, each as its attribute text (id left out).
-std::vector<std::map<std::string, std::string>> cycleStyles(const GrxStyleCycle& styleCycle);
-
-// The chart written out and read back with the validating parser; empty when that succeeds.
-std::string xercesProblems(const GrxVisualization& chart);
-// The chart written out and checked by xmllint against the chart grammar; empty when it passes
-// or when xmllint is not installed (then `skipped` is set).
-std::string xmllintProblems(const GrxVisualization& chart, bool* skipped = nullptr);
 
 } // namespace aesthetics_test
 
