@@ -42,38 +42,24 @@ std::string toHost(const char16_t* text) {
     return result;
 }
 
-} // namespace
-
-TEST(OsportConverter, RoundTripsUtf8ThroughUtf16) {
+TEST(OsportConverter, RoundTripsUtf8AndCodePage1252) {
     Converter utf8 = converter("UTF-8");
     ASSERT_NE(utf8, nullptr);
-    struct Case {
-        std::string host;
-        std::u16string u16;
-    };
-    const Case cases[] = {
+    const std::pair<std::string, std::u16string> cases[] = {
         {"", u""},
-        {"plain ASCII <chart/>", u"plain ASCII <chart/>"},
-        {"Caf\xC3\xA9 \xC3\xBC\xC3\x9F", u"Caf\u00E9 \u00FC\u00DF"},
-        {"\xE2\x82\xAC 5", u"\u20AC 5"},
+        {std::string("a\0<chart/>", 10), std::u16string(u"a\0<chart/>", 10)}, // NULs are kept
+        {"Caf\xC3\xA9 \xC3\xBC\xC3\x9F \xE2\x82\xAC", u"Caf\u00E9 \u00FC\u00DF \u20AC"},
         {"\xF0\x9F\x93\x88", u"\U0001F4C8"}, // outside the BMP: a surrogate pair
     };
-    for (const Case& c : cases) {
-        std::u16string u16;
-        ASSERT_TRUE(KovarMBGenericToU16(utf8.get(), c.host, u16)) << c.host;
-        EXPECT_EQ(u16, c.u16) << c.host;
+    for (const auto& [host, u16] : cases) {
+        std::u16string wide;
+        ASSERT_TRUE(KovarMBGenericToU16(utf8.get(), host, wide)) << host;
+        EXPECT_EQ(wide, u16) << host;
         std::string back;
-        ASSERT_TRUE(KovarMBU16ToGeneric(utf8.get(), u16.c_str(), back));
-        EXPECT_EQ(back, c.host);
+        ASSERT_TRUE(KovarMBU16ToGeneric(utf8.get(), wide.c_str(), back));
+        EXPECT_EQ(back, host.substr(0, host.find('\0')));
     }
-    std::u16string pair;
-    ASSERT_TRUE(KovarMBGenericToU16(utf8.get(), "\xF0\x9F\x93\x88", pair));
-    ASSERT_EQ(pair.size(), 2u);
-    EXPECT_EQ(pair[0], 0xD83D);
-    EXPECT_EQ(pair[1], 0xDCC8);
-}
 
-TEST(OsportConverter, CodePage1252) {
     Converter cp = converter("CP1252");
     ASSERT_NE(cp, nullptr);
     std::u16string u16;
@@ -87,18 +73,12 @@ TEST(OsportConverter, CodePage1252) {
     EXPECT_TRUE(host.empty());
 }
 
-TEST(OsportConverter, RejectsInvalidInput) {
+TEST(OsportConverter, RejectsInvalidInputAndUnknownCodePages) {
     Converter utf8 = converter("UTF-8");
     ASSERT_NE(utf8, nullptr);
-    const std::string invalid[] = {
-        "\xC3",             // truncated
-        "a\x80z",           // stray continuation byte
-        "\xC0\xAF",         // overlong '/'
-        "\xED\xA0\x80",     // an encoded surrogate
-        "\xF4\x90\x80\x80", // beyond U+10FFFF
-        "\xFF",
-    };
-    for (const std::string& text : invalid) {
+    // truncated, stray continuation byte, overlong '/', encoded surrogate, beyond U+10FFFF
+    for (const std::string text :
+         {"\xC3", "a\x80z", "\xC0\xAF", "\xED\xA0\x80", "\xF4\x90\x80\x80", "\xFF"}) {
         std::u16string out = u"stale";
         EXPECT_FALSE(KovarMBGenericToU16(utf8.get(), text, out)) << testing::PrintToString(text);
         EXPECT_TRUE(out.empty());
@@ -111,50 +91,31 @@ TEST(OsportConverter, RejectsInvalidInput) {
     EXPECT_FALSE(KovarMBU16ToGeneric(nullptr, u"x", out));
     std::u16string u16;
     EXPECT_FALSE(KovarMBGenericToU16(nullptr, "x", u16));
-}
 
-TEST(OsportConverter, KeepsEmbeddedNulsOfHostText) {
-    Converter utf8 = converter("UTF-8");
-    std::u16string u16;
-    ASSERT_TRUE(KovarMBGenericToU16(utf8.get(), std::string("a\0b", 3), u16));
-    EXPECT_EQ(u16, std::u16string(u"a\0b", 3));
-}
-
-TEST(OsportConverter, UnknownCodePageGivesNoConverter) {
-    EXPECT_EQ(KovarMBConverterNew_A(0, "NO-SUCH-CODEPAGE-42"), nullptr);
-    EXPECT_EQ(KovarMBConverterNew_A(0, ""), nullptr);
-    EXPECT_EQ(KovarMBConverterNew_A(0, nullptr), nullptr);
+    for (const char* name : {"NO-SUCH-CODEPAGE-42", "", static_cast<const char*>(nullptr)})
+        EXPECT_EQ(KovarMBConverterNew_A(0, name), nullptr);
     KovarMBConverterDelete_A(nullptr);
 }
 
-TEST_F(HostEncoding, DefaultsToUtf8) {
-    EXPECT_EQ(hostEncoding(), "UTF-8");
-    EXPECT_EQ(toU16("Gr\xC3\xBC\xC3\x9F"
-                    "e"),
-              u"Gr\u00FC\u00DFe");
-    EXPECT_EQ(toHost(u"\u00C5ngstr\u00F6m \U0001F600"), "\xC3\x85ngstr\xC3\xB6m \xF0\x9F\x98\x80");
-    EXPECT_EQ(toU16(""), u"");
-}
-
 TEST_F(HostEncoding, FreeFunctionsFollowTheHostCodePage) {
+    EXPECT_EQ(hostEncoding(), "UTF-8");
+    EXPECT_EQ(toU16("Gr\xC3\xBC\xC3\x9F"), u"Gr\u00FC\u00DF");
+    EXPECT_EQ(toHost(u"\u00C5 \U0001F600"), "\xC3\x85 \xF0\x9F\x98\x80");
+    EXPECT_EQ(toU16("bad \xE2\x82"), u"<null>");
+    const char16_t lone[] = {0xDC00, 0};
+    EXPECT_EQ(toHost(lone), "<null>");
+    EXPECT_EQ(KovarMBTranscodeGeneric(static_cast<const char*>(nullptr)), nullptr);
+    EXPECT_EQ(KovarMBTranscodeGeneric(static_cast<const char16_t*>(nullptr)), nullptr);
+    KovarMBRelease(static_cast<char*>(nullptr));
+    KovarMBRelease(static_cast<char16_t*>(nullptr));
+
     ASSERT_TRUE(setHostEncoding("CP1252"));
     EXPECT_EQ(hostEncoding(), "CP1252");
     EXPECT_EQ(toU16("\x80"), u"\u20AC");
     EXPECT_EQ(toHost(u"\u20AC\u00E9"), "\x80\xE9");
     EXPECT_EQ(toHost(u"\u4E2D"), "<null>");
-}
 
-TEST_F(HostEncoding, InvalidInputGivesNull) {
-    EXPECT_EQ(KovarMBTranscodeGeneric(static_cast<const char*>(nullptr)), nullptr);
-    EXPECT_EQ(KovarMBTranscodeGeneric(static_cast<const char16_t*>(nullptr)), nullptr);
-    EXPECT_EQ(toU16("bad \xE2\x82"), u"<null>");
-    const char16_t lone[] = {0xDC00, 0};
-    EXPECT_EQ(toHost(lone), "<null>");
-    KovarMBRelease(static_cast<char*>(nullptr));
-    KovarMBRelease(static_cast<char16_t*>(nullptr));
-}
-
-TEST_F(HostEncoding, UnknownNameLeavesEncodingUnchanged) {
+    // An unknown name leaves the encoding as it was.
     ASSERT_TRUE(setHostEncoding("ISO-8859-1"));
     EXPECT_FALSE(setHostEncoding("NO-SUCH-CODEPAGE-42"));
     EXPECT_FALSE(setHostEncoding(""));
@@ -162,25 +123,15 @@ TEST_F(HostEncoding, UnknownNameLeavesEncodingUnchanged) {
     EXPECT_EQ(toU16("\xE9"), u"\u00E9");
 }
 
-TEST_F(HostEncoding, StrincStepsOverUtf8Characters) {
+TEST_F(HostEncoding, StrincStepsOverWholeCharactersAndNeverPastTheNul) {
     const char* text = "a\xC3\xA9\xE2\x82\xAC\xF0\x9F\x93\x88z";
     const char* p = text;
-    p = KovarMBstrinc_A(p);
-    EXPECT_EQ(p - text, 1);
-    p = KovarMBstrinc_A(p);
-    EXPECT_EQ(p - text, 3);
-    p = KovarMBstrinc_A(p);
-    EXPECT_EQ(p - text, 6);
-    p = KovarMBstrinc_A(p);
-    EXPECT_EQ(p - text, 10);
-    p = KovarMBstrinc_A(p);
-    EXPECT_EQ(p - text, 11);
-    EXPECT_EQ(KovarMBstrinc_A(p), p); // at the NUL
+    for (int expected : {1, 3, 6, 10, 11, 11}) { // the last step stays at the NUL
+        p = KovarMBstrinc_A(p);
+        EXPECT_EQ(p - text, expected);
+    }
     EXPECT_EQ(KovarMBstrinc_A(nullptr), nullptr);
-}
-
-TEST_F(HostEncoding, StrincNeverStepsPastTheNul) {
-    // A lead byte promising more than the text holds.
+    // A lead byte promising more than the text holds, and stray bytes.
     const char truncated[] = {'\xF0', '\x9F', '\0', 'x', '\0'};
     EXPECT_EQ(KovarMBstrinc_A(truncated), truncated + 1);
     EXPECT_EQ(KovarMBstrinc_A(truncated + 1), truncated + 2);
@@ -188,13 +139,11 @@ TEST_F(HostEncoding, StrincNeverStepsPastTheNul) {
     const char stray[] = "\x80\xFF";
     EXPECT_EQ(KovarMBstrinc_A(stray), stray + 1);
     EXPECT_EQ(KovarMBstrinc_A(stray + 1), stray + 2);
-}
 
-TEST_F(HostEncoding, StrincInSingleAndDoubleByteCodePages) {
     ASSERT_TRUE(setHostEncoding("CP1252"));
-    const char* text = "\xC3\xA9\x80";
-    EXPECT_EQ(KovarMBstrinc_A(text), text + 1);
-    EXPECT_EQ(KovarMBstrinc_A(text + 2), text + 3);
+    const char* single = "\xC3\xA9\x80";
+    EXPECT_EQ(KovarMBstrinc_A(single), single + 1);
+    EXPECT_EQ(KovarMBstrinc_A(single + 2), single + 3);
 
     ASSERT_TRUE(setHostEncoding("CP932"));
     const char* sjis = "\x93\xFA"
@@ -204,3 +153,5 @@ TEST_F(HostEncoding, StrincInSingleAndDoubleByteCodePages) {
     EXPECT_EQ(KovarMBstrinc_A(sjis + 3), sjis + 4); // a lead byte cut off by the NUL
     EXPECT_EQ(toU16("\x93\xFA"), u"\u65E5");
 }
+
+} // namespace
