@@ -3,19 +3,11 @@
 
 #include "support/TestSupport.h"
 
-#include <cstdlib>
 #include <filesystem>
-#include <fstream>
 #include <optional>
-#include <sstream>
 #include <string>
 
-#include <unistd.h>
-
 namespace foundation_test {
-
-using ::ScopedEnv;
-using ::TempDir;
 
 // The folder where the error log and the dumps go, switched on for the lifetime of the object.
 class DumpFolder {
@@ -24,10 +16,8 @@ public:
         : path_("DumpChartXMLPath", dir_.path()), options_("DumpChartXMLOptions", options) {}
 
     const TempDir& dir() const { return dir_; }
-    std::string log() const { return read(dir_.file("chartxml_error.log")); }
+    std::string log() const { return readAll(dir_.file("chartxml_error.log")); }
     bool hasLog() const { return std::filesystem::exists(dir_.file("chartxml_error.log")); }
-
-    static std::string read(const std::string& file) { return readAll(file); }
 
 private:
     TempDir dir_;
@@ -52,22 +42,13 @@ private:
     std::filesystem::path old_;
 };
 
-inline void writeFile(const std::string& path, const std::string& text) {
-    std::ofstream out(path, std::ios::binary);
-    out << text;
-}
-
 inline std::string testData(const std::string& name) {
     return std::string(PLOTAID_TEST_DATA_DIR) + "/foundation/" + name;
 }
 
 // Points the path service at the test resource folder.
-class TestResources {
-public:
-    TestResources() : env_("PLOTAID_RESOURCE_DIR", testData("resources")) {}
-
-private:
-    ScopedEnv env_;
+struct TestResources {
+    ScopedEnv env{"PLOTAID_RESOURCE_DIR", testData("resources")};
 };
 
 } // namespace foundation_test
