@@ -4,71 +4,24 @@
 #include <gtest/gtest.h>
 
 #include <set>
+#include <sstream>
 
 using namespace grammar_test;
 
 namespace {
 
 // The instruction tags of the walk, in its order.
-const char* const kInstructions[] = {"setStyle",
-                                     "addFrame",
-                                     "addHistogramSummaryFrame",
-                                     "addImage",
-                                     "setColor",
-                                     "setDash",
-                                     "setPattern",
-                                     "setShape",
-                                     "setSize",
-                                     "setStyleCycle",
-                                     "setAxisScale",
-                                     "setAxisInterval",
-                                     "setAxisMargin",
-                                     "setAxisStyle",
-                                     "setAxisMajorTicks",
-                                     "setAxisMinorTicks",
-                                     "setBackPlane",
-                                     "setWireFrame",
-                                     "addReferenceLine",
-                                     "addReferenceRectangle",
-                                     "addAnchoredAnnotation",
-                                     "addFitLine",
-                                     "addHistogramNormalLine",
-                                     "addInterpolationLine",
-                                     "setWrapPanels",
-                                     "setAxisOpposite",
-                                     "addDerivedAxis",
-                                     "addOriginLine",
-                                     "addBarEffects",
-                                     "addPieEffects",
-                                     "addPopups",
-                                     "addDrillDown",
-                                     "addShadow",
-                                     "addDash",
-                                     "addDataLabels",
-                                     "setScaleByFraction",
-                                     "setTranspose",
-                                     "setPieTranspose",
-                                     "setPanelOptions",
-                                     "setRotation",
-                                     "setTickLabelFormat",
-                                     "setCategorySorting",
-                                     "setCollapse",
-                                     "setClusterWidth",
-                                     "setExclude",
-                                     "setOrder",
-                                     "setExplodeSlice",
-                                     "setProjectionLine",
-                                     "setTickLabelAngle",
-                                     "addSpikes",
-                                     "addStyleCycle",
-                                     "setTickLabelFrequency",
-                                     "setHistogramBinning",
-                                     "setScatterplotBinning",
-                                     "hideFrame",
-                                     "setShowLineMarkers",
-                                     "setErrorBarOptions",
-                                     "addChartsOnDiagonal",
-                                     "setGenericAttributes"};
+const char* const kInstructions =
+    "setStyle addFrame addHistogramSummaryFrame addImage setColor setDash setPattern setShape setSize "
+    "setStyleCycle setAxisScale setAxisInterval setAxisMargin setAxisStyle setAxisMajorTicks "
+    "setAxisMinorTicks setBackPlane setWireFrame addReferenceLine addReferenceRectangle "
+    "addAnchoredAnnotation addFitLine addHistogramNormalLine addInterpolationLine setWrapPanels "
+    "setAxisOpposite addDerivedAxis addOriginLine addBarEffects addPieEffects addPopups addDrillDown "
+    "addShadow addDash addDataLabels setScaleByFraction setTranspose setPieTranspose setPanelOptions "
+    "setRotation setTickLabelFormat setCategorySorting setCollapse setClusterWidth setExclude setOrder "
+    "setExplodeSlice setProjectionLine setTickLabelAngle addSpikes addStyleCycle setTickLabelFrequency "
+    "setHistogramBinning setScatterplotBinning hideFrame setShowLineMarkers setErrorBarOptions "
+    "addChartsOnDiagonal setGenericAttributes";
 
 std::string templateText(const std::string& schema, const std::string& instructions) {
     return "<?xml version=\"1.0\" encoding=\"UTF-8\" standalone=\"no\"?>\n"
@@ -91,10 +44,12 @@ std::set<std::string> declaredElements(const std::string& schemaFile) {
 }
 
 TEST(TemplateGrammar, DeclaresEveryInstructionOfTheWalk) {
-    ASSERT_EQ(std::size(kInstructions), 59u);
     const std::set<std::string> declared = declaredElements("grxml-template-3.5.xsd");
-    for (const char* tag : kInstructions)
+    std::istringstream tags(kInstructions);
+    std::size_t count = 0;
+    for (std::string tag; tags >> tag; ++count)
         EXPECT_EQ(declared.count(tag), 1u) << tag;
+    EXPECT_EQ(count, 59u);
 }
 
 class TemplateLint : public ::testing::Test {
