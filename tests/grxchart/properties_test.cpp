@@ -60,12 +60,17 @@ TEST_F(Built, ACreatedDocumentGetsItsIdsDeclaredWhenWrapped) {
 }
 
 TEST_F(Built, ReferencesResolveToTheSameWrapper) {
+    GrxStyle& taken = vis.addStyle();
+    taken.setId(u"style1");
     GrxStyle& style = vis.addStyle();
     GrrUviza& graph = vis.addGraph();
-    // The target gets an id of its own when it has none.
+    // The target gets an id of its own when it has none, avoiding the ones in use; one that has an
+    // id keeps it.
     graph.setStyle(style);
-    EXPECT_FALSE(ChartString(style.getId()).empty());
+    EXPECT_TRUE(ChartString(style.getId()).equals(u"style2"));
     EXPECT_EQ(graph.getStyle(), &style);
+    graph.setCellStyle(taken);
+    EXPECT_TRUE(ChartString(graph.GetAttribute(u"cellStyle")).equals(u"style1"));
 
     GrxCoordinates& coords = graph.addCoordinates();
     GrxPoint& point = graph.addPoint();
@@ -233,10 +238,6 @@ TEST_F(Built, RemovalKeepsEarlierPointersUsable) {
     EXPECT_EQ(graph.getLines().size(), 1u);
 }
 
-} // namespace
-
-namespace {
-
 TEST_F(Built, OnlyChartElementsAreWrapped) {
     DOMDocument* doc = vis.getDOMDocument();
     DOMElement* foreign = doc->createElementNS(u"urn:other", GrxUni::_style);
@@ -255,23 +256,6 @@ TEST_F(Built, OnlyChartElementsAreWrapped) {
     // Nodes of another document are never wrapped into this one.
     GrxVisualization other(grxtest::newChartDocument()->getDocumentElement(), true);
     EXPECT_EQ(vis.wrap(other.addLegend().getImplementation()), nullptr);
-}
-
-} // namespace
-
-namespace {
-
-TEST_F(Built, MadeUpIdsAvoidTheOnesInUse) {
-    GrxStyle& taken = vis.addStyle();
-    taken.setId(u"style1");
-    GrxStyle& unnamed = vis.addStyle();
-    GrrUviza& graph = vis.addGraph();
-    graph.setStyle(unnamed);
-    EXPECT_TRUE(ChartString(unnamed.getId()).equals(u"style2"));
-    EXPECT_EQ(graph.getStyle(), &unnamed);
-    // A target that has an id keeps it.
-    graph.setCellStyle(taken);
-    EXPECT_TRUE(ChartString(graph.GetAttribute(u"cellStyle")).equals(u"style1"));
 }
 
 TEST_F(Built, PositionalRemovalAndMixedStatistics) {
@@ -325,10 +309,6 @@ TEST(Document, AReferenceDocumentWrapsLikeAVisualization) {
     EXPECT_EQ(location->getDocument(), &reference);
     EXPECT_NE(legend->getParentNode()->getUserData(GrxUni::_container), nullptr);
 }
-
-} // namespace
-
-namespace {
 
 TEST_F(Built, HostileNamesAndDepthAreHandled) {
     GrxStyle& style = vis.addStyle();
