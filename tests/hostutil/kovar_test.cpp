@@ -11,15 +11,9 @@
 
 namespace {
 
-std::uint64_t grouping() {
-    std::uint64_t v;
-    std::memcpy(&v, static_cast<unsigned char*>(kovar::pvGetCmnSys()) + 624, sizeof v);
-    return v;
-}
-
-std::uint32_t minIntegerDigits() {
-    std::uint32_t v;
-    std::memcpy(&v, static_cast<unsigned char*>(kovar::pvGetCmnSys()) + 736, sizeof v);
+template <typename T> T systemField(std::size_t offset) {
+    T v;
+    std::memcpy(&v, static_cast<unsigned char*>(kovar::pvGetCmnSys()) + offset, sizeof v);
     return v;
 }
 
@@ -41,17 +35,12 @@ protected:
 } // namespace
 
 TEST(KovarFormat, WidthRuleKeepsWideTextFormatsOnly) {
-    EXPECT_EQ(Kovar_Format(1, 60, 0).GetWidth(), 60);
     EXPECT_EQ(Kovar_Format(2, 32767, 0).GetWidth(), 32767);
-    EXPECT_EQ(Kovar_Format(5, 60, 2).GetWidth(), 40);
-    EXPECT_EQ(Kovar_Format(5, 40, 2).GetWidth(), 40);
     EXPECT_EQ(Kovar_Format(5, 41, 2).GetWidth(), 40);
     EXPECT_EQ(Kovar_Format(20, 11, 0).GetWidth(), 11);
-    const Kovar_Format f(17, 12, 3);
-    EXPECT_EQ(f.GetType(), 17);
-    EXPECT_EQ(f.GetDecimals(), 3);
+    EXPECT_EQ(Kovar_Format(17, 12, 3).GetType(), 17);
+    EXPECT_EQ(Kovar_Format(17, 12, 3).GetDecimals(), 3);
     EXPECT_EQ(sizeof(Kovar_Format), 4u);
-
     Kovar_Format text(1, 100, 0);
     text.SetType(5);
     EXPECT_EQ(text.GetWidth(), 40);
@@ -60,35 +49,29 @@ TEST(KovarFormat, WidthRuleKeepsWideTextFormatsOnly) {
     EXPECT_EQ(number.GetWidth(), 40);
 }
 
-TEST_F(HostSettings, SystemBlockHasTheDefaultsAtTheHostsOffsets) {
-    EXPECT_EQ(grouping(), 0u);
-    EXPECT_EQ(minIntegerDigits(), 1u);
+TEST_F(HostSettings, SystemBlockThresholdAndCurrencies) {
+    // Grouping and minimum integer digits sit at the host's offsets, with the host's defaults.
+    EXPECT_EQ(systemField<std::uint64_t>(624), 0u);
+    EXPECT_EQ(systemField<std::uint32_t>(736), 1u);
     kovar::setDigitGrouping(true);
     kovar::setMinIntegerDigits(3);
-    EXPECT_NE(grouping(), 0u);
-    EXPECT_EQ(minIntegerDigits(), 3u);
-    // The same block every time.
-    EXPECT_EQ(kovar::pvGetCmnSys(), kovar::pvGetCmnSys());
+    EXPECT_NE(systemField<std::uint64_t>(624), 0u);
+    EXPECT_EQ(systemField<std::uint32_t>(736), 3u);
     kovar::resetCmnSys();
-    EXPECT_EQ(grouping(), 0u);
-    EXPECT_EQ(minIntegerDigits(), 1u);
-}
+    EXPECT_EQ(systemField<std::uint64_t>(624), 0u);
+    EXPECT_EQ(systemField<std::uint32_t>(736), 1u);
 
-TEST_F(HostSettings, SmallNumberThresholdAndCurrencies) {
     EXPECT_DOUBLE_EQ(kovar::GETGFORMATSMALL(), 0.0001);
     kovar::setGFormatSmall(0.5);
     EXPECT_DOUBLE_EQ(kovar::GETGFORMATSMALL(), 0.5);
 
     const kovar::currencyFormat currencies;
     for (int i = -1; i <= 5; ++i) {
-        const kovar::customCurrency c = currencies.GetCCX(i);
-        EXPECT_EQ(c.negativePrefix, "-");
-        EXPECT_EQ(c.decimalIndicator, ".");
-        EXPECT_EQ(c.prefix, "");
+        EXPECT_EQ(currencies.GetCCX(i).negativePrefix, "-") << i;
+        EXPECT_EQ(currencies.GetCCX(i).decimalIndicator, ".") << i;
     }
     kovar::currencyFormat::SetCCX(2, {"EUR ", " net", "(", ")", ","});
     kovar::currencyFormat::SetCCX(7, {"never", "", "", "", ""});
-    EXPECT_EQ(currencies.GetCCX(2).prefix, "EUR ");
     EXPECT_EQ(currencies.GetCCX(2).negativeSuffix, ")");
     EXPECT_EQ(currencies.GetCCX(1).prefix, "");
     EXPECT_EQ(currencies.GetCCX(7).prefix, "");
@@ -96,41 +79,42 @@ TEST_F(HostSettings, SmallNumberThresholdAndCurrencies) {
     EXPECT_EQ(print(1234.5, 35, 20, 2), "    EUR 1.234,50 net");
 }
 
-TEST(KovarToString, NumbersAreRightAlignedInTheirWidth) {
-    EXPECT_EQ(print(3.14159, 5, 8, 2), "    3.14");
-    EXPECT_EQ(print(-2, 5, 6, 1), "  -2.0");
-    EXPECT_EQ(print(1234567.891, 3, 14, 2), "  1,234,567.89");
-    EXPECT_EQ(print(1234.5, 4, 10, 2), " $1,234.50");
-    EXPECT_EQ(print(1234.5, 32, 10, 2), "  1.234,50");
-    EXPECT_EQ(print(12.5, 31, 6, 1), " 12.5%");
-    EXPECT_EQ(print(12345.0, 17, 10, 2), "  1.23e+04");
-    EXPECT_EQ(print(999.0, 3, 3, 0), "999");
-    EXPECT_EQ(print(1000.0, 3, 4, 0), "****"); // "1,000" does not fit
-    EXPECT_EQ(print(kovar::kMissingValue, 5, 8, 2), "       .");
-    EXPECT_EQ(print(5.0, 5, 0, 0), "");
-}
-
-TEST(KovarToString, HalvesRoundAwayFromZero) {
-    EXPECT_EQ(print(42.25, 5, 5, 1), " 42.3");
-    EXPECT_EQ(print(2.675, 5, 5, 2), " 2.68");
-    EXPECT_EQ(print(0.5, 5, 3, 0), "  1");
-    EXPECT_EQ(print(-0.5, 5, 3, 0), " -1");
-    EXPECT_EQ(print(9.995, 5, 6, 2), " 10.00");
-    EXPECT_EQ(print(999.5, 3, 5, 0), "1,000");
-    EXPECT_EQ(print(0.04, 5, 4, 1), " 0.0");
-    EXPECT_EQ(print(3.0, 5, 6, 3), " 3.000");
-}
-
-TEST(KovarToString, DatesAndTimesCountSecondsFromTheCalendarStart) {
-    EXPECT_EQ(print(0.0, 39, 10, 0), "1582/10/14");
-    EXPECT_EQ(print(86400.0, 20, 11, 0), "15-OCT-1582");
+TEST(KovarToString, RightAlignedRoundedHalfAwayDatesFromTheCalendarStart) {
     const double y2k = 152385.0 * 86400.0; // 2000-01-01: 141428 + 10957 days
-    EXPECT_EQ(print(y2k, 23, 10, 0), "01/01/2000");
-    EXPECT_EQ(print(y2k + 59 * 86400.0, 38, 10, 0), "29.02.2000");
-    EXPECT_EQ(print(y2k + 3723.0, 22, 20, 0), "01-JAN-2000 01:02:03");
-    EXPECT_EQ(print(90061.0, 25, 10, 0), "1 01:01:01");
-    EXPECT_EQ(print(37815.0, 21, 8, 0), "10:30:15");
-    EXPECT_EQ(print(1e300, 20, 11, 0), "***********");
+    const struct {
+        double value;
+        std::uint8_t type;
+        std::uint16_t width;
+        std::uint8_t decimals;
+        const char* expected;
+    } rows[] = {
+        {3.14159, 5, 8, 2, "    3.14"},
+        {1234567.891, 3, 14, 2, "  1,234,567.89"},
+        {1234.5, 4, 10, 2, " $1,234.50"},
+        {1234.5, 32, 10, 2, "  1.234,50"},
+        {12.5, 31, 6, 1, " 12.5%"},
+        {12345.0, 17, 10, 2, "  1.23e+04"},
+        {999.0, 3, 3, 0, "999"},
+        {1000.0, 3, 4, 0, "****"}, // "1,000" does not fit
+        {kovar::kMissingValue, 5, 8, 2, "       ."},
+        {5.0, 5, 0, 0, ""},
+        {2.675, 5, 5, 2, " 2.68"},
+        {-0.5, 5, 3, 0, " -1"},
+        {9.995, 5, 6, 2, " 10.00"},
+        {999.5, 3, 5, 0, "1,000"},
+        {0.04, 5, 4, 1, " 0.0"},
+        {0.0, 39, 10, 0, "1582/10/14"},
+        {86400.0, 20, 11, 0, "15-OCT-1582"},
+        {y2k, 23, 10, 0, "01/01/2000"},
+        {y2k + 59 * 86400.0, 38, 10, 0, "29.02.2000"},
+        {y2k + 3723.0, 22, 20, 0, "01-JAN-2000 01:02:03"},
+        {90061.0, 25, 10, 0, "1 01:01:01"},
+        {37815.0, 21, 8, 0, "10:30:15"},
+        {1e300, 20, 11, 0, "***********"},
+    };
+    for (const auto& r : rows)
+        EXPECT_EQ(print(r.value, r.type, r.width, r.decimals), r.expected)
+            << r.value << " type " << int(r.type);
 }
 
 TEST(KovarToString, IgnoresTheProcessNumericLocale) {

@@ -1,4 +1,4 @@
-#include "TempDir.h"
+#include "support/TestSupport.h"
 
 #include <feed/memory.h>
 #include <kovar/KovarGoToCaller.h>
@@ -37,102 +37,74 @@ protected:
 
 } // namespace
 
-TEST_F(SplitInfo, LabelListsEachSplitVariableWithItsValue) {
+TEST_F(SplitInfo, LabelAndHeadingOfTheLatestCase) {
+    feed::BpProcedure graph("GRAPH");
+    splitInfo info;
+    EXPECT_EQ(info.getSplitLabel(true), "");
+    EXPECT_EQ(info.activateSplit(graph), nullptr); // before any saveSplitInfo
     source.variable(region).valueLabels().add(2.0, "North");
+    cases.setNumber(region, 1.0);
+    cases.setText(city, "A");
+    info.saveSplitInfo(&cases, &source);
     cases.setNumber(region, 2.0);
     cases.setText(city, "Oslo");
-    splitInfo info;
     EXPECT_TRUE(info.saveSplitInfo(&cases, &source));
     EXPECT_EQ(info.getSplitLabel(true), "region = North, city = Oslo");
     // Without a label of its own, the variable shows its name.
     EXPECT_EQ(info.getSplitLabel(false), "Sales region = North, city = Oslo");
+
+    std::unique_ptr<feed::BpHeading> heading(info.activateSplit(graph));
+    ASSERT_NE(heading, nullptr);
+    EXPECT_EQ(heading->Procedure(), "GRAPH");
+    EXPECT_EQ(heading->Pattern(), "[%1 = %2:, ^1 = ^2:]1");
+    ASSERT_EQ(heading->Parts().size(), 2u);
+    EXPECT_EQ(heading->Parts()[1], (std::vector<std::string>{"city", "Oslo"}));
+    EXPECT_EQ(heading->Text(), "Sales region = North, city = Oslo");
+    source.suppressSplitHeading("FREQUENCIES");
+    feed::BpProcedure frequencies("FREQUENCIES");
+    EXPECT_EQ(info.activateSplit(frequencies), nullptr);
+
+    // A null source keeps the entries but gives no heading.
+    EXPECT_TRUE(info.saveSplitInfo(&cases, nullptr));
+    EXPECT_EQ(info.getSplitLabel(true), "region = North, city = Oslo");
+    EXPECT_EQ(info.activateSplit(graph), nullptr);
+
+    // Split variables that cannot be read are skipped; amount has no value in the case.
+    source.setSplitVariables({region, 99, -1, city, amount});
+    EXPECT_TRUE(info.saveSplitInfo(&cases, &source));
+    EXPECT_EQ(info.getSplitLabel(true), "region = North, city = Oslo");
+    EXPECT_TRUE(info.saveSplitInfo(nullptr, &source));
+    EXPECT_EQ(info.getSplitLabel(true), "");
 }
 
-TEST_F(SplitInfo, ValueTextsOfNumbers) {
-    source.setSplitVariables({amount});
+TEST_F(SplitInfo, ValueTexts) {
+    source.setSplitVariables({amount, city});
     source.variable(amount).addMissingValue(-9.0);
     splitInfo info;
-    cases.setNumber(amount, 1234.5);
-    info.saveSplitInfo(&cases, &source);
-    EXPECT_EQ(info.getSplitLabel(true), "amount = 1234.50"); // printed, blanks trimmed
-
-    cases.setNumber(amount, kovar::kMissingValue);
-    info.saveSplitInfo(&cases, &source);
-    EXPECT_EQ(info.getSplitLabel(true), "amount = <blank>");
-
-    cases.setNumber(amount, -9.0); // user-missing
-    info.saveSplitInfo(&cases, &source);
-    EXPECT_EQ(info.getSplitLabel(true), "amount = <blank>");
-
-    // A value label wins over the missing-value text.
+    const auto label = [&](double number, const std::string& text) {
+        cases.setNumber(amount, number);
+        cases.setText(city, text);
+        info.saveSplitInfo(&cases, &source);
+        return info.getSplitLabel(true);
+    };
+    // Numbers printed, blanks trimmed; texts cut to the width, trailing blanks removed, leading kept.
+    EXPECT_EQ(label(1234.5, "  Rio de Janeiro"), "amount = 1234.50, city =   Rio de Jan");
+    // System-missing, user-missing and blank texts read as the blank-value message.
+    EXPECT_EQ(label(kovar::kMissingValue, "    "), "amount = <blank>, city = <blank>");
+    EXPECT_EQ(label(-9.0, ""), "amount = <blank>, city = <blank>");
+    // Value labels win over the missing-value text.
     source.variable(amount).valueLabels().add(-9.0, "Refused");
-    info.saveSplitInfo(&cases, &source);
-    EXPECT_EQ(info.getSplitLabel(true), "amount = Refused");
-}
-
-TEST_F(SplitInfo, ValueTextsOfTexts) {
-    source.setSplitVariables({city});
-    splitInfo info;
-    cases.setText(city, "    ");
-    info.saveSplitInfo(&cases, &source);
-    EXPECT_EQ(info.getSplitLabel(true), "city = <blank>");
-
-    // Only as many characters as the width, trailing blanks removed, leading kept.
-    cases.setText(city, "  Rio de Janeiro");
-    info.saveSplitInfo(&cases, &source);
-    EXPECT_EQ(info.getSplitLabel(true), "city =   Rio de Jan");
-
     source.variable(city).valueLabels().add("  Rio de Jan", "Rio");
-    info.saveSplitInfo(&cases, &source);
-    EXPECT_EQ(info.getSplitLabel(true), "city = Rio");
-}
+    EXPECT_EQ(label(-9.0, "  Rio de Janeiro"), "amount = Refused, city = Rio");
 
-TEST_F(SplitInfo, TextShorterInTheCaseThanItsWidthIsReadOnlyAsFarAsItGoes) {
+    // A text shorter in the case than its width is read only as far as it goes; type 2 is text too.
     const int wide = source.addVariable("note", "", Kovar_Format(1, 200, 0));
-    source.setSplitVariables({wide});
-    cases.setText(wide, "short"); // one cell, though the format claims 200 characters
-    splitInfo info;
-    info.saveSplitInfo(&cases, &source);
-    EXPECT_EQ(info.getSplitLabel(true), "note = short");
-}
-
-TEST_F(SplitInfo, SecondTypeOfTextIsReadAsCharactersToo) {
     const int code = source.addVariable("code", "", Kovar_Format(2, 4, 0));
-    source.setSplitVariables({code});
+    source.setSplitVariables({wide, code});
+    cases.setText(wide, "short");
     cases.setText(code, "AB12");
-    splitInfo info;
     info.saveSplitInfo(&cases, &source);
-    EXPECT_EQ(info.getSplitLabel(true), "code = AB12");
-}
-
-TEST_F(SplitInfo, MessageComesFromTheHostLanguageWithEnglishFallback) {
-    std::ofstream(dir.path() + "/messages/common.de.txt") << "E60712\tfehlt\n";
-    source.setSplitVariables({city});
-    cases.setText(city, "");
-    const std::string before = msgbook::hostLanguage();
-    msgbook::setHostLanguage("de");
-    splitInfo german;
-    msgbook::setHostLanguage("fr");
-    splitInfo french;
-    msgbook::setHostLanguage(before);
-    german.saveSplitInfo(&cases, &source);
-    french.saveSplitInfo(&cases, &source);
-    EXPECT_EQ(german.getSplitLabel(true), "city = fehlt");
-    EXPECT_EQ(french.getSplitLabel(true), "city = <blank>");
-}
-
-TEST_F(SplitInfo, UnreadableSplitVariablesAreSkipped) {
-    source.setSplitVariables({region, 99, -1, city, amount});
-    cases.setNumber(region, 1.0);
-    cases.setText(city, "Bergen");
-    // amount has no value in the case
-    splitInfo info;
-    EXPECT_TRUE(info.saveSplitInfo(&cases, &source));
-    EXPECT_EQ(info.getSplitLabel(true), "region = 1, city = Bergen");
-
-    splitInfo withoutCases;
-    EXPECT_TRUE(withoutCases.saveSplitInfo(nullptr, &source));
-    EXPECT_EQ(withoutCases.getSplitLabel(true), "");
+    EXPECT_EQ(info.getSplitLabel(true), "note = short, code = AB12");
 }
 
 namespace {
@@ -169,20 +141,15 @@ private:
 };
 } // namespace
 
-TEST_F(SplitInfo, HostFailureOnOneVariableCostsOnlyThatVariable) {
+TEST_F(SplitInfo, HostFailureCostsOnlyThatVariableUnwindingPassesThrough) {
     PartlyFailingSource failing(source);
     cases.setNumber(7, 1.0);
     cases.setNumber(region, 3.0);
     splitInfo info;
     EXPECT_TRUE(info.saveSplitInfo(&cases, &failing));
     EXPECT_EQ(info.getSplitLabel(true), "region = 3");
-}
 
-TEST_F(SplitInfo, HostUnwindingPassesThrough) {
-    PartlyFailingSource failing(source);
     failing.unwindInstead();
-    cases.setNumber(7, 1.0);
-    splitInfo info;
     try {
         info.saveSplitInfo(&cases, &failing);
         ADD_FAILURE() << "the host's unwinding was swallowed";
@@ -191,55 +158,24 @@ TEST_F(SplitInfo, HostUnwindingPassesThrough) {
     }
 }
 
-TEST_F(SplitInfo, NewCaseReplacesTheEntriesAndNullSourceKeepsThem) {
-    splitInfo info;
-    EXPECT_EQ(info.getSplitLabel(true), "");
-    cases.setNumber(region, 1.0);
-    cases.setText(city, "A");
-    info.saveSplitInfo(&cases, &source);
-    cases.setNumber(region, 2.0);
-    cases.setText(city, "B");
-    info.saveSplitInfo(&cases, &source);
-    EXPECT_EQ(info.getSplitLabel(true), "region = 2, city = B");
+TEST_F(SplitInfo, BlankMessageInTheHostLanguageWithEnglishFallback) {
+    std::ofstream(dir.path() + "/messages/common.de.txt") << "E60712\tfehlt\n";
+    source.setSplitVariables({city});
+    cases.setText(city, "");
+    const std::string before = msgbook::hostLanguage();
+    msgbook::setHostLanguage("de");
+    splitInfo german;
+    msgbook::setHostLanguage("fr");
+    splitInfo french;
+    msgbook::setHostLanguage(before);
+    german.saveSplitInfo(&cases, &source);
+    french.saveSplitInfo(&cases, &source);
+    EXPECT_EQ(german.getSplitLabel(true), "city = fehlt");
+    EXPECT_EQ(french.getSplitLabel(true), "city = <blank>");
 
-    feed::BpProcedure graph("GRAPH");
-    EXPECT_TRUE(info.saveSplitInfo(&cases, nullptr));
-    EXPECT_EQ(info.getSplitLabel(true), "region = 2, city = B");
-    EXPECT_EQ(info.activateSplit(graph), nullptr);
-}
-
-TEST_F(SplitInfo, HeadingCarriesEachVariableAndItsRawValue) {
-    feed::BpProcedure graph("GRAPH");
-    splitInfo info;
-    EXPECT_EQ(info.activateSplit(graph), nullptr); // before any saveSplitInfo
-
-    source.variable(region).valueLabels().add(2.0, "North");
-    cases.setNumber(region, 2.0);
-    cases.setText(city, "Oslo");
-    info.saveSplitInfo(&cases, &source);
-    std::unique_ptr<feed::BpHeading> heading(info.activateSplit(graph));
-    ASSERT_NE(heading, nullptr);
-    EXPECT_EQ(heading->Procedure(), "GRAPH");
-    EXPECT_EQ(heading->Pattern(), "[%1 = %2:, ^1 = ^2:]1");
-    ASSERT_EQ(heading->Parts().size(), 2u);
-    // Show mode 2 gives the label, preference 2 the value label.
-    EXPECT_EQ(heading->Parts()[0], (std::vector<std::string>{"Sales region", "North"}));
-    EXPECT_EQ(heading->Parts()[1], (std::vector<std::string>{"city", "Oslo"}));
-    EXPECT_EQ(heading->Text(), "Sales region = North, city = Oslo");
-
-    source.suppressSplitHeading("FREQUENCIES");
-    feed::BpProcedure frequencies("FREQUENCIES");
-    EXPECT_EQ(info.activateSplit(frequencies), nullptr);
-}
-
-TEST(SplitInfoShipped, BlankValueMessageOfTheSourceTree) {
-    ScopedEnv resources("PLOTAID_RESOURCE_DIR", (std::string(PLOTAID_SOURCE_DIR) + "/resources").c_str());
-    feed::MemoryDataSource source;
-    const int v = source.addVariable("v", "", Kovar_Format(5, 8, 0));
-    source.setSplitVariables({v});
-    feed::MemoryCase cases;
-    cases.setNumber(v, kovar::kMissingValue);
+    // The shipped wording.
+    ScopedEnv shipped("PLOTAID_RESOURCE_DIR", (std::string(PLOTAID_SOURCE_DIR) + "/resources").c_str());
     splitInfo info;
     info.saveSplitInfo(&cases, &source);
-    EXPECT_EQ(info.getSplitLabel(false), "v = Missing");
+    EXPECT_EQ(info.getSplitLabel(false), "city = Missing");
 }

@@ -1,43 +1,58 @@
-#include "TempDir.h"
+#include "support/TestSupport.h"
 
+#include <plotaid/ChartBase.h>
 #include <plotaid/TimeStamp.h>
 
 #include <gtest/gtest.h>
 
 #include <chrono>
+#include <ctime>
 #include <filesystem>
 #include <regex>
+#include <sstream>
 #include <string>
 #include <thread>
+#include <vector>
 
 namespace {
 
-// tag, wall clock, elapsed seconds, total elapsed seconds, text.
-const std::regex
-    kLine(R"((.*) time = (\d\d):(\d\d):(\d\d)\.(\d{3}) elapsed seconds = ( *\d+)\.(\d{3}) )"
-          R"(total elapsed seconds = ( *\d+)\.(\d{3}) (.*))");
+std::vector<std::string> readLines(const std::string& path) {
+    std::vector<std::string> lines;
+    std::istringstream in(readAll(path));
+    for (std::string line; std::getline(in, line);)
+        lines.push_back(line);
+    return lines;
+}
 
+// tag, wall clock, elapsed seconds, total elapsed seconds, text.
 struct Parsed {
-    std::string tag, text;
-    int hours = -1, minutes = -1, seconds = -1;
+    std::string tag, text, elapsedField, totalField;
     double elapsed = -1, total = -1;
-    std::string elapsedField, totalField;
 };
 
 bool parse(const std::string& line, Parsed& out) {
+    static const std::regex layout(
+        R"((.*) time = ([01]\d|2[0-3]):[0-5]\d:[0-6]\d\.\d{3} )"
+        R"(elapsed seconds = ( *\d+)\.(\d{3}) total elapsed seconds = ( *\d+)\.(\d{3}) (.*))");
     std::smatch m;
-    if (!std::regex_match(line, m, kLine))
+    if (!std::regex_match(line, m, layout))
         return false;
-    out.tag = m[1];
-    out.hours = std::stoi(m[2]);
-    out.minutes = std::stoi(m[3]);
-    out.seconds = std::stoi(m[4]);
-    out.elapsedField = m[6];
-    out.totalField = m[8];
-    out.elapsed = std::stoi(m[6]) + std::stoi(m[7]) / 1000.0;
-    out.total = std::stoi(m[8]) + std::stoi(m[9]) / 1000.0;
-    out.text = m[10];
+    out = {m[1],
+           m[7],
+           m[3],
+           m[5],
+           std::stoi(m[3]) + std::stoi(m[4]) / 1000.0,
+           std::stoi(m[5]) + std::stoi(m[6]) / 1000.0};
     return true;
+}
+
+std::vector<Parsed> parsedLines(const std::string& path) {
+    std::vector<Parsed> out;
+    for (const std::string& line : readLines(path)) {
+        out.emplace_back();
+        EXPECT_TRUE(parse(line, out.back())) << line;
+    }
+    return out;
 }
 
 } // namespace
@@ -46,81 +61,49 @@ TEST(TimeStamp, FileNameCarriesTheNumberInAtLeastTwoDigits) {
     EXPECT_EQ(TimeStamp("P", 0).fileName(), "P00.txt");
     EXPECT_EQ(TimeStamp("/x/log_", 7).fileName(), "/x/log_07.txt");
     EXPECT_EQ(TimeStamp("log", 123).fileName(), "log123.txt");
-    TimeStamp renumbered("q", 1);
-    renumbered.setFileNum(42);
-    EXPECT_EQ(renumbered.fileName(), "q42.txt");
 }
 
 TEST(TimeStamp, LinesFollowTheLayoutAndAppend) {
     TempDir dir;
-    ASSERT_FALSE(dir.path().empty());
     const std::string prefix = dir.path() + "/P";
     TimeStamp stamp(prefix, 0);
     stamp.logTime("load", "first step");
     std::this_thread::sleep_for(std::chrono::milliseconds(30));
     stamp.logTime("", "second step");
-
-    ASSERT_TRUE(std::filesystem::exists(dir.path() + "/P00.txt"));
-    const auto lines = readLines(dir.path() + "/P00.txt");
-    ASSERT_EQ(lines.size(), 2u);
-    Parsed first, second;
-    ASSERT_TRUE(parse(lines[0], first)) << lines[0];
-    ASSERT_TRUE(parse(lines[1], second)) << lines[1];
-    EXPECT_EQ(first.tag, "load");
-    EXPECT_EQ(first.text, "first step");
-    EXPECT_EQ(second.tag, "");
-    EXPECT_EQ(second.text, "second step");
-    EXPECT_EQ(lines[1].rfind(" time = ", 0), 0u) << "an empty tag leaves the line starting with a blank";
-
-    // The first line's two durations are the same; both are padded with blanks to three digits.
-    EXPECT_EQ(first.elapsedField, first.totalField);
-    EXPECT_EQ(first.elapsedField.size(), 3u);
-    EXPECT_GE(second.elapsed, 0.030);
-    EXPECT_GE(second.total, first.total + second.elapsed - 0.0005);
-    for (const Parsed* p : {&first, &second}) {
-        EXPECT_LT(p->hours, 24);
-        EXPECT_LT(p->minutes, 60);
-        EXPECT_LT(p->seconds, 61);
-    }
-
-    // A second stamp over the same file appends rather than replaces.
-    TimeStamp again(prefix, 0);
+    TimeStamp again(prefix, 0); // appends rather than replaces
     again.logTime("t", "third");
-    EXPECT_EQ(readLines(dir.path() + "/P00.txt").size(), 3u);
+
+    const std::vector<Parsed> lines = parsedLines(dir.path() + "/P00.txt");
+    ASSERT_EQ(lines.size(), 3u);
+    EXPECT_EQ(lines[0].tag, "load");
+    EXPECT_EQ(lines[0].text, "first step");
+    EXPECT_EQ(lines[1].tag, "");
+    EXPECT_EQ(lines[1].text, "second step");
+    // The first line's two durations are the same, padded with blanks to three digits.
+    EXPECT_EQ(lines[0].elapsedField, lines[0].totalField);
+    EXPECT_EQ(lines[0].elapsedField.size(), 3u);
+    EXPECT_GE(lines[1].elapsed, 0.030);
+    EXPECT_GE(lines[1].total, lines[0].total + lines[1].elapsed - 0.0005);
 }
 
-TEST(TimeStamp, SetFileNumRestartsTheClocksAndSwitchesFile) {
+TEST(TimeStamp, RenumberingRestartsTheClocksCopiesShareTheStart) {
     TempDir dir;
-    ASSERT_FALSE(dir.path().empty());
     TimeStamp stamp(dir.path() + "/run", 1);
     std::this_thread::sleep_for(std::chrono::milliseconds(30));
+    TimeStamp copy(stamp);
     stamp.setFileNum(2);
     stamp.logTime("a", "b");
-    EXPECT_FALSE(std::filesystem::exists(dir.path() + "/run01.txt"));
-    const auto lines = readLines(dir.path() + "/run02.txt");
-    ASSERT_EQ(lines.size(), 1u);
-    Parsed p;
-    ASSERT_TRUE(parse(lines[0], p)) << lines[0];
-    EXPECT_LT(p.total, 0.030);
-}
-
-TEST(TimeStamp, CopiesShareTheStartButLogOnTheirOwn) {
-    TempDir dir;
-    ASSERT_FALSE(dir.path().empty());
-    TimeStamp stamp(dir.path() + "/c", 3);
-    std::this_thread::sleep_for(std::chrono::milliseconds(20));
-    TimeStamp copy(stamp);
     copy.logTime("copy", "x");
-    const auto lines = readLines(dir.path() + "/c03.txt");
-    ASSERT_EQ(lines.size(), 1u);
-    Parsed p;
-    ASSERT_TRUE(parse(lines[0], p)) << lines[0];
-    EXPECT_GE(p.total, 0.020);
+    const std::vector<Parsed> renumbered = parsedLines(dir.path() + "/run02.txt");
+    const std::vector<Parsed> copied = parsedLines(dir.path() + "/run01.txt");
+    ASSERT_EQ(renumbered.size(), 1u);
+    ASSERT_EQ(copied.size(), 1u);
+    EXPECT_LT(renumbered[0].total, 0.030);
+    EXPECT_GE(copied[0].total, 0.030);
 }
 
 TEST(TimeStamp, TextIsWrittenByteForByteAndUnopenableFileIsSilent) {
     TempDir dir;
-    ASSERT_FALSE(dir.path().empty());
     TimeStamp stamp(dir.path() + "/n", 0);
     stamp.logTime(std::string("t\0g", 3), std::string("a\0b", 3));
     const std::string all = readAll(dir.path() + "/n00.txt");
@@ -130,4 +113,42 @@ TEST(TimeStamp, TextIsWrittenByteForByteAndUnopenableFileIsSilent) {
     TimeStamp lost(dir.path() + "/no/such/folder/x", 0);
     lost.logTime("a", "b"); // must neither crash nor create anything
     EXPECT_FALSE(std::filesystem::exists(dir.path() + "/no"));
+}
+
+// One test: the debug log is fixed for the process at its first use.
+TEST(PrintDebugInfo, WritesTheProcessTimingLogOnlyWhenAsked) {
+    const auto expectedName = [] {
+        static const char* const months[] = {"Jan", "Feb", "Mar", "Apr", "May", "Jun",
+                                             "Jul", "Aug", "Sep", "Oct", "Nov", "Dec"};
+        const std::time_t now = std::time(nullptr);
+        std::tm local{};
+        localtime_r(&now, &local);
+        // ctime's layout: the day of the month padded with a blank to two.
+        return std::string("chartxmldebug_") + months[local.tm_mon] + (local.tm_mday < 10 ? " " : "") +
+               std::to_string(local.tm_mday) + "00.txt";
+    };
+    TempDir dir;
+    {
+        ScopedEnv off("DumpChartTimePath", nullptr);
+        ChartBase::printDebugInfo("not written");
+    }
+    EXPECT_TRUE(std::filesystem::is_empty(dir.path()));
+    const std::string nameBefore = expectedName();
+    {
+        ScopedEnv on("DumpChartTimePath", dir.path().c_str());
+        ChartBase::printDebugInfo("first");
+        ChartBase::printDebugInfo("second");
+    }
+    ChartBase::printDebugInfo("unset again: not written");
+    const std::string nameAfter = expectedName(); // the date may roll over meanwhile
+
+    std::vector<std::string> files;
+    for (const auto& entry : std::filesystem::directory_iterator(dir.path()))
+        files.push_back(entry.path().filename().string());
+    ASSERT_EQ(files.size(), 1u);
+    EXPECT_TRUE(files[0] == nameBefore || files[0] == nameAfter) << files[0];
+    const std::vector<Parsed> lines = parsedLines(dir.path() + "/" + files[0]);
+    ASSERT_EQ(lines.size(), 2u);
+    EXPECT_EQ(lines[0].tag + lines[0].text, "first");
+    EXPECT_EQ(lines[1].tag + lines[1].text, "second");
 }
