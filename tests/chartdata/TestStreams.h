@@ -7,6 +7,7 @@
 
 #include <cstdint>
 #include <cstring>
+#include <initializer_list>
 #include <limits>
 #include <memory>
 #include <string>
@@ -51,11 +52,10 @@ inline std::uint32_t u32At(const std::string& raw, std::size_t at) {
     return v;
 }
 
-inline void appendU32(std::string& out, std::uint32_t v, bool bigEndian = false) {
-    for (int i = 0; i < 4; ++i) {
-        const int shift = bigEndian ? 24 - 8 * i : 8 * i;
-        out += static_cast<char>(v >> shift & 0xFF);
-    }
+inline void appendU32(std::string& out, std::initializer_list<std::uint32_t> values, bool bigEndian = false) {
+    for (std::uint32_t v : values)
+        for (int i = 0; i < 4; ++i)
+            out += static_cast<char>(v >> (bigEndian ? 24 - 8 * i : 8 * i) & 0xFF);
 }
 
 inline void appendDouble(std::string& out, double v, bool bigEndian = false) {

@@ -16,7 +16,6 @@ TEST(VarDataStore, CapacityIsClampedAndNamesAreUnique) {
     EXPECT_EQ(store.GetCapacity("large"), 20000u);
     EXPECT_EQ(store.GetCapacity("mid"), 3000u);
     EXPECT_EQ(store.GetCapacity("absent"), 0u);
-
     EXPECT_TRUE(store.AddVariable("auto", "x"));
     EXPECT_EQ(store.GetCapacity("auto"), 1000u);
     EXPECT_FALSE(store.AddVariable("auto", "x"));
@@ -27,93 +26,76 @@ TEST(VarDataStore, CapacityIsClampedAndNamesAreUnique) {
     EXPECT_EQ(names, (std::vector<std::string>{"auto", "large", "mid", "small"}));
 }
 
-TEST(VarDataStore, GrowingDoublesCapacityAndKeepsValues) {
+TEST(VarDataStore, GrowingKeepsValuesAndTheRowCountIsTheLongestVariable) {
     VarDataProcessor store;
     store.AddDataSource("s", 0);
     for (unsigned r = 0; r < 1000; ++r)
         ASSERT_TRUE(store.SetVariableValue("s", "v", r, r * 0.5));
-    EXPECT_EQ(store.GetCapacity("s"), 1000u);
     ASSERT_TRUE(store.SetVariableValue("s", "v", 1000, 7));
-    EXPECT_EQ(store.GetCapacity("s"), 2000u);
+    EXPECT_EQ(store.GetCapacity("s"), 2000u); // doubled
     const double* cells = store.GetDataPointer("s", "v");
-    for (unsigned r = 0; r < 1000; ++r)
-        ASSERT_EQ(cells[r], r * 0.5);
-    EXPECT_EQ(cells[1000], 7);
-    for (unsigned r = 1001; r < 2000; ++r)
-        ASSERT_EQ(cells[r], kMissing);
+    for (unsigned r = 0; r < 2000; ++r)
+        ASSERT_EQ(cells[r], r < 1000 ? r * 0.5 : r == 1000 ? 7 : kMissing) << r;
     EXPECT_FALSE(store.SetVariableValue("absent", "v", 0, 1));
     EXPECT_FALSE(store.SetVariableValue("s", "v", 0xFFFFFFFFu, 1));
-}
 
-TEST(VarDataStore, RowCountIsTheLongestVariable) {
-    VarDataProcessor store;
-    store.AddDataSource("s", 0);
     const double three[] = {1, 2, 3};
     ASSERT_TRUE(store.SetVariableValueRange("s", "a", three, 0, 3));
-    ASSERT_TRUE(store.SetVariableValue("s", "b", 9, 4));
-    EXPECT_EQ(store.GetRowCount("s"), 10u);
-    const double* a = store.GetDataPointer("s", "a");
-    for (unsigned r = 3; r < 10; ++r)
-        EXPECT_EQ(a[r], kMissing);
-    EXPECT_EQ(store.GetValueAsString("s", "a", 5), "");
-
+    EXPECT_EQ(store.GetRowCount("s"), 1001u);
+    EXPECT_EQ(store.GetDataPointer("s", "a")[3], kMissing);
     ASSERT_TRUE(store.InitializeVariableValueRange("s", "c", 2.5, 4, 3));
     EXPECT_EQ(store.GetDataPointer("s", "c")[6], 2.5);
     EXPECT_EQ(store.GetDataPointer("s", "c")[3], kMissing);
     // A count of 0 only raises the row count, and the arrays grow with it.
-    ASSERT_TRUE(store.SetVariableValueRange("s", "d", nullptr, 1500, 0));
-    EXPECT_EQ(store.GetRowCount("s"), 1500u);
-    EXPECT_GE(store.GetCapacity("s"), 1500u);
+    ASSERT_TRUE(store.SetVariableValueRange("s", "d", nullptr, 2500, 0));
+    EXPECT_EQ(store.GetRowCount("s"), 2500u);
+    EXPECT_GE(store.GetCapacity("s"), 2500u);
+    EXPECT_EQ(store.GetDataPointer("s", "a")[2499], kMissing);
     EXPECT_FALSE(store.SetVariableValueRange("s", "d", nullptr, 0, 2));
     EXPECT_FALSE(store.SetVariableValueRange("s", "d", three, 0xFFFFFFFEu, 3));
+
+    // The record setter grows the arrays too.
+    VarDataProcessor::_varinfo info, empty;
+    store.AddVariable("t", "v", &info);
+    for (unsigned r = 0; r < 3000; ++r)
+        ASSERT_TRUE(store.SetVariableValue(&info, r, r));
+    EXPECT_EQ(store.GetCapacity("t"), 4000u);
+    EXPECT_EQ(store.GetRowCount("t"), 3000u);
+    EXPECT_EQ(store.GetDataPointer("t", "v")[2999], 2999);
+    EXPECT_FALSE(store.SetVariableValue(&empty, 0, 1));
+    EXPECT_FALSE(store.SetVariableValue(nullptr, 0, 1));
 }
 
-TEST(VarDataStore, DeleteRowShiftsValuesAndStrings) {
+TEST(VarDataStore, ValuesAsTextAndDeletedRows) {
     VarDataProcessor store;
     store.AddDataSource("s", 0);
-    const double five[] = {10, 11, 12, 13, 14};
-    store.SetVariableValueRange("s", "v", five, 0, 5);
-    store.SetVariableValue("s", "short", 0, 1);
-    store.SetStringVariableValue("s", "v", 0, "zero");
-    store.SetStringVariableValue("s", "v", 3, "three");
-    EXPECT_EQ(store.DeleteRow("s", 0), 4u);
-    const double* v = store.GetDataPointer("s", "v");
-    EXPECT_EQ(v[0], 11);
-    EXPECT_EQ(v[3], 14);
-    EXPECT_EQ(v[4], kMissing);
-    EXPECT_EQ(store.GetValueAsString("s", "v", 2), "three");
-    EXPECT_EQ(store.GetValueAsString("s", "v", 3), "14");
-    EXPECT_EQ(store.GetValueAsString("s", "short", 0), "");
-    // "zero" lost its only reference: its slot is free and is the next one taken.
-    store.SetStringVariableValue("s", "v", 0, "new");
-    EXPECT_EQ(store.GetValueAsString("s", "v", 0), "new");
-    EXPECT_EQ(store.DeleteRow("s", 10), 4u);
-    EXPECT_EQ(store.DeleteRow("absent", 0), 0u);
-}
-
-TEST(VarDataStore, ValuesAsText) {
-    VarDataProcessor store;
-    store.AddDataSource("s", 0);
-    store.SetVariableValue("s", "v", 0, 3.0);
-    store.SetVariableValue("s", "v", 1, -2.0);
-    store.SetVariableValue("s", "v", 2, kMissing);
-    store.SetVariableValue("s", "v", 3, 0.1);
-    store.SetVariableValue("s", "v", 4, 2147483648.0);
-    store.SetVariableValue("s", "v", 5, -2147483648.0);
-    store.SetVariableValue("s", "v", 6, 1.5e300);
-    EXPECT_EQ(store.GetValueAsString("s", "v", 0), "3");
-    EXPECT_EQ(store.GetValueAsString("s", "v", 1), "-2");
-    EXPECT_EQ(store.GetValueAsString("s", "v", 2), "");
-    EXPECT_EQ(store.GetValueAsString("s", "v", 3), "0.1");
-    EXPECT_EQ(store.GetValueAsString("s", "v", 4), "2147483648");
-    EXPECT_EQ(store.GetValueAsString("s", "v", 5), "-2147483648");
-    EXPECT_EQ(store.GetValueAsString("s", "v", 6), "1.5e+300");
-    EXPECT_EQ(store.GetValueAsString("s", "v", 7), "");
+    const double values[] = {3.0, -2.0, kMissing, 0.1, 2147483648.0, -2147483648.0, 1.5e300};
+    store.SetVariableValueRange("s", "v", values, 0, 7);
+    const char* texts[] = {"3", "-2", "", "0.1", "2147483648", "-2147483648", "1.5e+300", ""};
+    for (unsigned r = 0; r < 8; ++r)
+        EXPECT_EQ(store.GetValueAsString("s", "v", r), texts[r]) << r;
     EXPECT_EQ(store.GetValueAsString("absent", "v", 0), "");
     // An absent variable of a known data source is created, and reads as missing.
     EXPECT_EQ(store.GetValueAsString("s", "new", 0), "");
     std::vector<std::string> names;
     EXPECT_EQ(store.GetVariableNames("s", names), 2);
+
+    store.SetStringVariableValue("s", "v", 0, "zero");
+    store.SetStringVariableValue("s", "v", 3, "three");
+    store.SetVariableValue("s", "short", 0, 1);
+    EXPECT_EQ(store.DeleteRow("s", 0), 6u);
+    EXPECT_EQ(store.GetValueAsString("s", "v", 0), "-2");
+    EXPECT_EQ(store.GetValueAsString("s", "v", 2), "three");
+    EXPECT_EQ(store.GetValueAsString("s", "v", 5), "1.5e+300");
+    EXPECT_EQ(store.GetDataPointer("s", "v")[6], kMissing);
+    EXPECT_EQ(store.GetValueAsString("s", "short", 0), "");
+    EXPECT_EQ(store.DeleteRow("s", 10), 6u);
+    EXPECT_EQ(store.DeleteRow("absent", 0), 0u);
+    // "zero" lost its only reference: its slot 0 is the next one taken.
+    VarDataProcessor::_varinfo info;
+    store.AddVariable("s", "w", &info);
+    store.SetStringVariableValue(&info, 0, "new");
+    EXPECT_EQ(info.stringMap->at(0), 0u);
 }
 
 TEST(VarDataStore, StringTableCountsReferencesAndReusesSlots) {
@@ -124,11 +106,8 @@ TEST(VarDataStore, StringTableCountsReferencesAndReusesSlots) {
     EXPECT_EQ(info.variable, "v");
     ASSERT_NE(info.column, nullptr);
     ASSERT_NE(info.stringMap, nullptr);
-
     ASSERT_TRUE(store.SetStringVariableValue("s", "v", 0, "first"));
-    EXPECT_EQ(info.stringMap->at(0), 0u);
-    ASSERT_TRUE(store.SetStringVariableValue("s", "v", 0, "second"));
-    // The first text lost its reference; the second took the freed slot.
+    ASSERT_TRUE(store.SetStringVariableValue("s", "v", 0, "second")); // takes the freed slot 0
     EXPECT_EQ(info.stringMap->at(0), 0u);
     EXPECT_EQ(store.GetValueAsString("s", "v", 0), "second");
     ASSERT_TRUE(store.SetStringVariableValue(&info, 4, "second"));
@@ -139,6 +118,16 @@ TEST(VarDataStore, StringTableCountsReferencesAndReusesSlots) {
     EXPECT_FALSE(store.SetStringVariableValue("s", "absent", 0, "x"));
     EXPECT_FALSE(store.SetStringVariableValue("absent", "v", 0, "x"));
     EXPECT_FALSE(store.SetStringVariableValue(nullptr, 0, "x"));
+
+    // The single setter keeps the arrays as long as the row count; the range setter leaves it.
+    ASSERT_TRUE(store.SetStringVariableValue("s", "v", 4999, "far"));
+    EXPECT_EQ(store.GetRowCount("s"), 5000u);
+    EXPECT_GE(store.GetCapacity("s"), 5000u);
+    EXPECT_EQ(store.GetDataPointer("s", "v")[4998], kMissing);
+    ASSERT_TRUE(store.SetStringVariableValueRange("s", "v", 6000, {"x", "y"}));
+    ASSERT_TRUE(store.SetStringVariableValueRange("s", "v", 0, {}));
+    EXPECT_EQ(store.GetRowCount("s"), 5000u);
+    EXPECT_FALSE(store.SetStringVariableValueRange("s", "nothing", 0, {"x"}));
 
     // Deleting the column gives back its references: the next texts reuse slots 0 and 1.
     ASSERT_TRUE(store.DeleteColumn("s", "v"));
@@ -151,44 +140,13 @@ TEST(VarDataStore, StringTableCountsReferencesAndReusesSlots) {
     EXPECT_EQ(other.stringMap->at(1), 1u);
 }
 
-TEST(VarDataStore, StringSettersKeepArraysAsLongAsTheRowCount) {
-    VarDataProcessor store;
-    store.AddVariable("s", "v");
-    ASSERT_TRUE(store.SetStringVariableValue("s", "v", 4999, "far"));
-    EXPECT_EQ(store.GetRowCount("s"), 5000u);
-    EXPECT_GE(store.GetCapacity("s"), 5000u);
-    EXPECT_EQ(store.GetDataPointer("s", "v")[4998], kMissing);
-
-    // The range setter leaves the row count as it was.
-    ASSERT_TRUE(store.SetStringVariableValueRange("s", "v", 6000, {"x", "y"}));
-    EXPECT_EQ(store.GetRowCount("s"), 5000u);
-    ASSERT_TRUE(store.SetStringVariableValueRange("s", "v", 0, {}));
-    EXPECT_FALSE(store.SetStringVariableValueRange("s", "nothing", 0, {"x"}));
-    EXPECT_EQ(store.GetValueAsString("s", "v", 4999), "far");
-}
-
-TEST(VarDataStore, VarinfoSetterGrowsThroughTheRecord) {
-    VarDataProcessor store;
-    VarDataProcessor::_varinfo info;
-    store.AddVariable("s", "v", &info);
-    for (unsigned r = 0; r < 3000; ++r)
-        ASSERT_TRUE(store.SetVariableValue(&info, r, r));
-    EXPECT_EQ(store.GetCapacity("s"), 4000u);
-    EXPECT_EQ(store.GetRowCount("s"), 3000u);
-    EXPECT_EQ(store.GetDataPointer("s", "v")[2999], 2999);
-    VarDataProcessor::_varinfo empty;
-    EXPECT_FALSE(store.SetVariableValue(&empty, 0, 1));
-    EXPECT_FALSE(store.SetVariableValue(nullptr, 0, 1));
-}
-
-TEST(VarDataStore, CopiesOwnTheirArrays) {
+TEST(VarDataStore, CopiesOwnTheirArraysMergeStopsAtAClashResetEmpties) {
     VarDataProcessor original;
     original.SetVariableValue("s", "v", 0, 1); // absent data source: refused
     EXPECT_EQ(original.GetRowCount("s"), 0u);
     original.AddVariable("s", "v");
     original.SetVariableValue("s", "v", 0, 1);
     original.SetStringVariableValue("s", "v", 1, "text");
-
     VarDataProcessor copy(original);
     VarDataProcessor assigned;
     assigned.AddVariable("old", "x");
@@ -196,53 +154,38 @@ TEST(VarDataStore, CopiesOwnTheirArrays) {
     original.SetVariableValue("s", "v", 0, 99);
     original.SetStringVariableValue("s", "v", 1, "changed");
     original.DeleteColumn("s", "v");
+    assigned = assigned;
     for (VarDataProcessor* c : {&copy, &assigned}) {
         EXPECT_EQ(c->GetValueAsString("s", "v", 0), "1");
         EXPECT_EQ(c->GetValueAsString("s", "v", 1), "text");
         EXPECT_EQ(c->GetCapacity("old"), 0u);
     }
-    assigned = assigned; // self-assignment keeps everything
-    EXPECT_EQ(assigned.GetValueAsString("s", "v", 1), "text");
     VarDataProcessor moved(std::move(copy));
-    EXPECT_EQ(moved.GetValueAsString("s", "v", 0), "1");
-    EXPECT_EQ(copy.GetRowCount("s"), 0u);
-}
+    EXPECT_EQ(moved.GetValueAsString("s", "v", 1), "text");
+    EXPECT_EQ(copy.GetRowCount("s"), 0u); // NOLINT(bugprone-use-after-move)
 
-TEST(VarDataStore, MergeCopiesSourcesAndStopsAtAClash) {
-    VarDataProcessor a;
-    a.SetVariableValue("x", "v", 0, 1); // refused: no data source
-    a.AddVariable("one", "v");
-    a.SetVariableValue("one", "v", 2, 5);
-    a.SetStringVariableValue("one", "v", 0, "label");
-    a.AddVariable("two", "w");
-    a.SetVariableValue("two", "w", 0, 8);
-
+    // Merging copies every source; a second merge stops at the first clash.
     VarDataProcessor target;
-    EXPECT_TRUE(target.AddVDP(a));
-    EXPECT_EQ(target.GetValueAsString("one", "v", 2), "5");
-    EXPECT_EQ(target.GetValueAsString("one", "v", 0), "label");
+    moved.AddVariable("two", "w");
+    moved.SetVariableValue("two", "w", 0, 8);
+    EXPECT_TRUE(target.AddVDP(moved));
+    EXPECT_EQ(target.GetValueAsString("s", "v", 1), "text");
     EXPECT_EQ(target.GetValueAsString("two", "w", 0), "8");
-    // Merging again clashes at the first data source and copies nothing more.
     VarDataProcessor b;
     b.AddVariable("aaa", "z");
     b.SetVariableValue("aaa", "z", 0, 3);
-    b.AddVariable("one", "v");
+    b.AddVariable("s", "v");
     b.AddVariable("zzz", "q");
     EXPECT_FALSE(target.AddVDP(b));
     EXPECT_EQ(target.GetValueAsString("aaa", "z", 0), "3");
     EXPECT_EQ(target.GetCapacity("zzz"), 0u);
     EXPECT_FALSE(target.AddVDP(target));
-}
 
-TEST(VarDataStore, ResetEmptiesEverything) {
-    VarDataProcessor store;
-    store.AddVariable("s", "v");
-    store.SetStringVariableValue("s", "v", 0, "t");
-    store.Reset();
+    target.Reset();
     std::vector<std::string> names;
-    EXPECT_EQ(store.GetSourceNames(names), 0);
-    EXPECT_FALSE(store.SetStringVariableValue("s", "v", 0, "t"));
-    store.AddVariable("s", "v");
-    store.SetStringVariableValue("s", "v", 0, "u");
-    EXPECT_EQ(store.GetValueAsString("s", "v", 0), "u");
+    EXPECT_EQ(target.GetSourceNames(names), 0);
+    EXPECT_FALSE(target.SetStringVariableValue("s", "v", 0, "t"));
+    target.AddVariable("s", "v");
+    target.SetStringVariableValue("s", "v", 0, "u");
+    EXPECT_EQ(target.GetValueAsString("s", "v", 0), "u");
 }

@@ -6,91 +6,68 @@
 #include <cmath>
 #include <cstring>
 #include <limits>
+#include <utility>
 
-using plotaid::detail::appendEscaped;
-using plotaid::detail::EscapeKind;
-using plotaid::detail::parseNumber;
-using plotaid::detail::unescape;
+using namespace plotaid::detail;
 
-namespace {
-
-struct Parsed {
-    bool whole;
-    double value;
-};
-
-Parsed parse(const char* text) {
-    Parsed p{};
-    p.whole = parseNumber(text, text + std::strlen(text), p.value);
-    return p;
-}
-
-} // namespace
-
-TEST(DataNumbers, ReadLikeAtofWithADot) {
-    EXPECT_EQ(parse("1.5").value, 1.5);
-    EXPECT_TRUE(parse("1.5").whole);
-    EXPECT_EQ(parse("  -2.5e3 ").value, -2500);
-    EXPECT_TRUE(parse("  -2.5e3 ").whole);
-    EXPECT_EQ(parse("+7").value, 7);
-    EXPECT_EQ(parse(".25").value, 0.25);
-    EXPECT_EQ(parse("0x1p3").value, 8);
-    EXPECT_EQ(parse("-0x10").value, -16);
-    EXPECT_EQ(parse("1e999").value, std::numeric_limits<double>::infinity());
-    EXPECT_EQ(parse("-1e999").value, -std::numeric_limits<double>::infinity());
-    EXPECT_EQ(parse("1e-400").value, 0);
-    EXPECT_TRUE(std::isnan(parse("nan").value));
-    EXPECT_EQ(parse("-inf").value, -std::numeric_limits<double>::infinity());
-    // A number followed by text reads its number part, but is not a number as a whole.
-    EXPECT_EQ(parse("12abc").value, 12);
-    EXPECT_FALSE(parse("12abc").whole);
-    EXPECT_EQ(parse("1,5").value, 1);
-    EXPECT_FALSE(parse("1,5").whole);
-    for (const char* none : {"", "   ", "abc", "--5", "+-5", "-", "."}) {
-        const Parsed p = parse(none);
-        EXPECT_EQ(p.value, 0) << '"' << none << '"';
-        EXPECT_FALSE(p.whole) << '"' << none << '"';
+TEST(DataNumbers, ReadLikeAtofWithADotWholeOnlyWithoutTrailingText) {
+    const double inf = std::numeric_limits<double>::infinity();
+    const struct {
+        const char* text;
+        double value;
+        bool whole;
+    } rows[] = {
+        {"1.5", 1.5, true},   {"  -2.5e3 ", -2500, true},
+        {"+7", 7, true},      {".25", 0.25, true},
+        {"0x1p3", 8, true},   {"-0x10", -16, true},
+        {"1e999", inf, true}, {"-inf", -inf, true},
+        {"1e-400", 0, true},  {"12abc", 12, false},
+        {"1,5", 1, false},    {"", 0, false},
+        {"   ", 0, false},    {"abc", 0, false},
+        {"--5", 0, false},    {"+-5", 0, false},
+        {"-", 0, false},      {".", 0, false},
+    };
+    for (const auto& r : rows) {
+        double value = -1;
+        EXPECT_EQ(parseNumber(r.text, r.text + std::strlen(r.text), value), r.whole) << '"' << r.text << '"';
+        EXPECT_EQ(value, r.value) << '"' << r.text << '"';
     }
-    // Never past the end it is given.
-    const char text[] = "123456";
-    double v = 0;
-    EXPECT_TRUE(parseNumber(text, text + 3, v));
-    EXPECT_EQ(v, 123);
+    double value = 0;
+    const char nan[] = "nan";
+    EXPECT_TRUE(parseNumber(nan, nan + 3, value));
+    EXPECT_TRUE(std::isnan(value));
+    const char text[] = "123456"; // never past the end it is given
+    EXPECT_TRUE(parseNumber(text, text + 3, value));
+    EXPECT_EQ(value, 123);
 }
 
 TEST(DataNumbers, CellsAsText) {
-    using plotaid::detail::formatCell;
-    EXPECT_EQ(formatCell(-std::numeric_limits<double>::max()), "");
-    EXPECT_EQ(formatCell(-0.0), "0");
-    EXPECT_EQ(formatCell(2147483647.0), "2147483647");
-    EXPECT_EQ(formatCell(2147483647.5), "2147483647.5");
-    EXPECT_EQ(formatCell(-2147483649.0), "-2147483649");
-    EXPECT_EQ(formatCell(0.1 + 0.2), "0.3"); // 16 digits, trailing zeros dropped
-    EXPECT_EQ(formatCell(1.0 / 3), "0.3333333333333333");
-    EXPECT_EQ(formatCell(std::numeric_limits<double>::infinity()), "inf");
+    const std::pair<double, const char*> rows[] = {
+        {-std::numeric_limits<double>::max(), ""},
+        {-0.0, "0"},
+        {2147483647.5, "2147483647.5"},
+        {-2147483649.0, "-2147483649"},
+        {0.1 + 0.2, "0.3"}, // 16 digits, trailing zeros dropped
+        {1.0 / 3, "0.3333333333333333"},
+        {std::numeric_limits<double>::infinity(), "inf"},
+    };
+    for (const auto& r : rows)
+        EXPECT_EQ(formatCell(r.first), r.second) << r.second;
 }
 
-TEST(DataXmlText, EscapingByKind) {
-    std::string out;
+TEST(DataXmlText, EscapingByKindAndUnescapingWellFormedReferencesOnly) {
+    std::string out = "kept:";
     appendEscaped(out, "a;\"&'<>b", EscapeKind::SourceName);
-    EXPECT_EQ(out, "a;&quot;&amp;&apos;&lt;&gt;b");
-    out.clear();
     appendEscaped(out, "a;b", EscapeKind::VariableName);
-    EXPECT_EQ(out, "a&#59;b");
-    out.clear();
     appendEscaped(out, "a;b", EscapeKind::Value);
-    EXPECT_EQ(out, "a,b");
-    out = "kept:";
     appendEscaped(out, "", EscapeKind::Value);
-    EXPECT_EQ(out, "kept:");
-}
+    EXPECT_EQ(out, "kept:a;&quot;&amp;&apos;&lt;&gt;ba&#59;ba,b");
 
-TEST(DataXmlText, UnescapeResolvesOnlyWellFormedReferences) {
     EXPECT_EQ(unescape("a&lt;b&gt;c&amp;d&quot;e&apos;f"), "a<b>c&d\"e'f");
     EXPECT_EQ(unescape("&#59;&#x3B;&#X41;"), ";;A");
     EXPECT_EQ(unescape("&#233;&#x20AC;&#x1F600;"), "\xC3\xA9\xE2\x82\xAC\xF0\x9F\x98\x80");
+    EXPECT_EQ(unescape("&&amp;"), "&&");
     for (const char* kept :
          {"&", "&amp", "&unknown;", "&#;", "&#x;", "&#0;", "&#xD800;", "&#x110000;", "&#12a;", "a & b", "&;"})
         EXPECT_EQ(unescape(kept), kept);
-    EXPECT_EQ(unescape("&&amp;"), "&&");
 }
