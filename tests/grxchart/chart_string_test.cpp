@@ -65,28 +65,23 @@ TEST(ChartString, EditsInPlace) {
     EXPECT_TRUE(text.empty());
 }
 
-TEST(ChartString, ConvertToIntegerReadsLikeStrtoul) {
-    EXPECT_EQ(ChartString("2").convertToInteger(), 2u);
-    EXPECT_EQ(ChartString("  42abc").convertToInteger(), 42u);
-    EXPECT_EQ(ChartString("0.5").convertToInteger(), 0u);
-    EXPECT_EQ(ChartString("").convertToInteger(), 0u);
-    EXPECT_EQ(ChartString("abc").convertToInteger(), 0u);
-    EXPECT_EQ(ChartString("+7").convertToInteger(), 7u);
+TEST(ChartString, IntegersReadLikeStrtoulOrSaturateWhenSigned) {
+    constexpr unsigned kMax = std::numeric_limits<unsigned>::max();
     // "-1" is neither 0 nor 1: it wraps, and reads -1 again as a signed number.
-    const unsigned minusOne = ChartString("-1").convertToInteger();
-    EXPECT_EQ(minusOne, std::numeric_limits<unsigned>::max());
-    EXPECT_EQ(static_cast<int>(minusOne), -1);
-    EXPECT_EQ(ChartString("99999999999999999999999").convertToInteger(),
-              std::numeric_limits<unsigned>::max());
-}
-
-TEST(ChartString, ConvertToSignedIntegerSaturates) {
-    EXPECT_EQ(ChartString("-5").convertToSignedInteger(), -5);
-    EXPECT_EQ(ChartString(" 12 ").convertToSignedInteger(), 12);
-    EXPECT_EQ(ChartString("-2147483648").convertToSignedInteger(), std::numeric_limits<int>::min());
-    EXPECT_EQ(ChartString("-99999999999").convertToSignedInteger(), std::numeric_limits<int>::min());
-    EXPECT_EQ(ChartString("99999999999").convertToSignedInteger(), std::numeric_limits<int>::max());
-    EXPECT_EQ(ChartString("x1").convertToSignedInteger(), 0);
+    const std::pair<const char*, unsigned> plain[] = {
+        {"2", 2u},   {"  42abc", 42u}, {"0.5", 0u},  {"", 0u},
+        {"abc", 0u}, {"+7", 7u},       {"-1", kMax}, {"99999999999999999999999", kMax}};
+    for (const auto& [text, value] : plain)
+        EXPECT_EQ(ChartString(text).convertToInteger(), value) << text;
+    EXPECT_EQ(static_cast<int>(ChartString("-1").convertToInteger()), -1);
+    const std::pair<const char*, int> sign[] = {{"-5", -5},
+                                                {" 12 ", 12},
+                                                {"-2147483648", std::numeric_limits<int>::min()},
+                                                {"-99999999999", std::numeric_limits<int>::min()},
+                                                {"99999999999", std::numeric_limits<int>::max()},
+                                                {"x1", 0}};
+    for (const auto& [text, value] : sign)
+        EXPECT_EQ(ChartString(text).convertToSignedInteger(), value) << text;
 }
 
 TEST(ChartString, ConvertToDoubleIgnoresTheLocale) {

@@ -92,40 +92,38 @@ TEST_F(Built, ReferencesResolveToTheSameWrapper) {
     EXPECT_EQ(point.referenced(GrxUni::_style), &coords);
 }
 
+// The three parts of a compound property as "preferred|minimum|maximum".
+template <typename Getter> std::string parts(Getter get) {
+    ChartString pref("stale"), min("stale"), max("stale");
+    get(&pref, &min, &max);
+    return pref.toUTF8() + "|" + min.toUTF8() + "|" + max.toUTF8();
+}
+
 TEST_F(Built, CompoundPropertiesKeepThePartsNotGiven) {
     GrxStyle& style = vis.addStyle();
+    const auto fontSize = [&](ChartString* p, ChartString* n, ChartString* x) { style.getFontSize(p, n, x); };
+    const auto width = [&](ChartString* p, ChartString* n, ChartString* x) { style.getWidth(p, n, x); };
     EXPECT_FALSE(style.isFontSizePresent());
     style.setFontSize(u"8pt", nullptr, nullptr);
     style.setFontSize(nullptr, u"6pt", nullptr);
-    ChartString pref, min, max;
-    style.getFontSize(&pref, &min, &max);
-    EXPECT_EQ(pref.toUTF8(), "8pt");
-    EXPECT_EQ(min.toUTF8(), "6pt");
-    EXPECT_TRUE(max.empty());
-    EXPECT_TRUE(style.isFontSizePresent());
-
+    EXPECT_EQ(parts(fontSize), "8pt|6pt|");
     // The maximum first, then the preferred width, into the same property.
     style.setWidth(nullptr, nullptr, u"20px");
     style.setWidth(u"1pt", nullptr, nullptr);
-    style.getWidth(&pref, &min, &max);
-    EXPECT_EQ(pref.toUTF8(), "1pt");
-    EXPECT_TRUE(min.empty());
-    EXPECT_EQ(max.toUTF8(), "20px");
+    EXPECT_EQ(parts(width), "1pt||20px");
     // An empty part clears that part; all empty removes the property.
     style.setWidth(u"", nullptr, u"");
     EXPECT_FALSE(style.isWidthPresent());
-
     // Only the minimum given still reads as a font size.
-    GrxStyle& other = vis.addStyle();
-    other.setFontSize(nullptr, u"7pt", nullptr);
-    EXPECT_TRUE(other.isFontSizePresent());
-    other.getFontSize(&pref, nullptr, nullptr);
-    EXPECT_TRUE(pref.empty());
+    style.setFontSize(u"", nullptr, nullptr);
+    EXPECT_TRUE(style.isFontSizePresent());
+    EXPECT_EQ(parts(fontSize), "|6pt|");
 
-    GrxStyle::getPreferredMinMax(u" 9pt ; ;12pt;junk", &pref, &min, &max);
-    EXPECT_EQ(pref.toUTF8(), "9pt");
-    EXPECT_TRUE(min.empty());
-    EXPECT_EQ(max.toUTF8(), "12pt");
+    EXPECT_EQ(parts([](ChartString* p, ChartString* n, ChartString* x) {
+                  GrxStyle::getPreferredMinMax(u" 9pt ; ;12pt;junk", p, n, x);
+              }),
+              "9pt||12pt");
+    ChartString pref("stale");
     GrxStyle::getPreferredMinMax(nullptr, &pref, nullptr, nullptr);
     EXPECT_TRUE(pref.empty());
 }
