@@ -15,23 +15,17 @@ namespace {
 Chart linesAreasAndPaths() {
     Chart chart = Chart::empty();
     GrxVisualization& vis = *chart.vis;
-    auto style = [&](const char16_t* id) -> GrxStyle& {
-        GrxStyle& s = vis.addStyle();
-        s.setId(id);
-        return s;
-    };
-    GrxStyle& container = style(u"c-o-n-t-a-i-n-er");
-    (void)container;
+    vis.addStyle().setId(u"c-o-n-t-a-i-n-er");
     GrrUviza& graph = vis.addGraph();
-    GrxLine& matching = graph.addLine();
-    matching.setId(u"line_a");
-    matching.setStyle(style(u"lineStyle"));
-    GrxLine& other = graph.addLine();
-    other.setId(u"line_b");
-    other.setStyle(style(u"otherLine"));
-    GrxArea& area = graph.addArea();
-    area.setId(u"area_a");
-    area.setStyle(style(u"areaStyle"));
+    auto styled = [&](CTElementType& e, const char16_t* id, const char16_t* style) {
+        e.setId(id);
+        GrxStyle& s = vis.addStyle();
+        s.setId(style);
+        e.setStyle(s);
+    };
+    styled(graph.addLine(), u"line_a", u"lineStyle");
+    styled(graph.addLine(), u"line_b", u"otherLine");
+    styled(graph.addArea(), u"area_a", u"areaStyle");
     graph.addPath().setId(u"path_a");
     return chart;
 }
@@ -60,7 +54,7 @@ protected:
     styleimport_test::StyleElements elements_;
 };
 
-TEST_F(Interpolation, StepRightSmoothsMatchingLinesAndEveryAreaAndPath) {
+TEST_F(Interpolation, MatchingLinesAndEveryAreaAndPathAreSmoothed) {
     import(u"lineStyle", R"(<interpolation type="step" pointPosition="right"/>)");
     EXPECT_EQ(method(u"line_a"), 14);
     EXPECT_EQ(method(u"line_b"), -1);
@@ -69,39 +63,36 @@ TEST_F(Interpolation, StepRightSmoothsMatchingLinesAndEveryAreaAndPath) {
     EXPECT_FALSE(element(u"line_a").getShowDiscontinuity());
     EXPECT_TRUE(element(u"line_a").isShowDiscontinuityPresent());
     EXPECT_FALSE(element(u"line_b").isShowDiscontinuityPresent());
-}
-
-TEST_F(Interpolation, PositionAndTypeChooseTheMethod) {
-    import(u"lineStyle", R"(<interpolation type="jump" pointPosition="left"/>)");
-    EXPECT_EQ(method(u"line_a"), 13);
-    EXPECT_TRUE(element(u"line_a").getShowDiscontinuity());
-    import(u"lineStyle", R"(<interpolation type="step" pointPosition="center"/>)");
-    EXPECT_EQ(method(u"line_a"), 15);
-    EXPECT_FALSE(element(u"line_a").getShowDiscontinuity());
-    import(u"lineStyle", R"(<interpolation type="step"/>)");
-    EXPECT_EQ(method(u"line_a"), 15);
-    import(u"lineStyle", R"(<interpolation type="straight" pointPosition="left"/>)");
-    EXPECT_EQ(method(u"line_a"), 0);
-    // One smooth statistic, reused each time.
-    EXPECT_EQ(element(u"line_a").getSmoothStatistics().size(), 1u);
-    EXPECT_EQ(element(u"area_a").getSmoothStatistics().size(), 1u);
-}
-
-TEST_F(Interpolation, TheMethodIsWrittenSoItReadsBack) {
-    import(u"lineStyle", R"(<interpolation type="jump" pointPosition="right"/>)");
-    const Chart reread = Chart::parse(chart_.vis->AsUTF8());
-    ASSERT_TRUE(reread.vis);
-    const auto* line = GrxBaseElement::wrapperOf<CTElementType>(reread.vis->getElementById(u"line_a"));
-    ASSERT_NE(line, nullptr);
-    ASSERT_EQ(line->getSmoothStatistics().size(), 1u);
-    EXPECT_EQ(line->getSmoothStatistics().front()->getMethod(), 14);
-    EXPECT_TRUE(line->getShowDiscontinuity());
-}
-
-TEST_F(Interpolation, TheContainerStyleMatchesEveryLine) {
+    // The container style matches every line.
     import(u"c-o-n-t-a-i-n-er", R"(<interpolation type="step" pointPosition="left"/>)");
     EXPECT_EQ(method(u"line_a"), 13);
     EXPECT_EQ(method(u"line_b"), 13);
+}
+
+TEST_F(Interpolation, PositionAndTypeChooseTheMethodOfOneReusedStatistic) {
+    const struct {
+        const char* interpolation;
+        int method;
+        bool discontinuity;
+    } rows[] = {{R"(<interpolation type="jump" pointPosition="left"/>)", 13, true},
+                {R"(<interpolation type="step"/>)", 15, false},
+                {R"(<interpolation type="jump" pointPosition="right"/>)", 14, true},
+                {R"(<interpolation type="step" pointPosition="center"/>)", 15, false},
+                {R"(<interpolation type="straight" pointPosition="left"/>)", 0, false}};
+    for (const auto& row : rows) {
+        import(u"lineStyle", row.interpolation);
+        EXPECT_EQ(method(u"line_a"), row.method) << row.interpolation;
+        EXPECT_EQ(element(u"line_a").getShowDiscontinuity(), row.discontinuity) << row.interpolation;
+        // Written so that it reads back.
+        const Chart reread = Chart::parse(chart_.vis->AsUTF8());
+        ASSERT_TRUE(reread.vis);
+        const auto* line = GrxBaseElement::wrapperOf<CTElementType>(reread.vis->getElementById(u"line_a"));
+        ASSERT_NE(line, nullptr);
+        ASSERT_EQ(line->getSmoothStatistics().size(), 1u);
+        EXPECT_EQ(line->getSmoothStatistics().front()->getMethod(), row.method) << row.interpolation;
+    }
+    EXPECT_EQ(element(u"line_a").getSmoothStatistics().size(), 1u);
+    EXPECT_EQ(element(u"area_a").getSmoothStatistics().size(), 1u);
 }
 
 TEST_F(Interpolation, WithoutATypeNothingIsSmoothedButElementsGetStyles) {
@@ -118,14 +109,25 @@ TEST_F(Interpolation, WithoutATypeNothingIsSmoothedButElementsGetStyles) {
     EXPECT_EQ(element(u"path_a").getStyle(), added);
 }
 
-TEST_F(Interpolation, MissingValuesOnlyWhereTheSourceSetsNoBreakRepresentation) {
+TEST_F(Interpolation, MissingValuesOnlyWhereTheSourceHoldsTheElementWithNoBreakRepresentation) {
+    // No source, or a source without the element: nothing.
+    const Chart elsewhere = Chart::empty();
+    for (const Chart* source : {static_cast<const Chart*>(nullptr), &elsewhere}) {
+        import(u"lineStyle", R"(<interpolation missingRepresentation="gap"/>)", source);
+        EXPECT_FALSE(element(u"line_a").isBreakRepresentationPresent());
+    }
+    // A source with a representation of its own keeps it.
+    Chart own = linesAreasAndPaths();
+    GrxBaseElement::wrapperOf<CTElementType>(own.vis->getElementById(u"line_a"))->setBreakRepresentation(2);
+    import(u"lineStyle", R"(<interpolation missingRepresentation="gap"/>)", &own);
+    EXPECT_FALSE(element(u"line_a").isBreakRepresentationPresent());
+
     const Chart source = linesAreasAndPaths();
     import(u"lineStyle", R"(<interpolation missingRepresentation="wings"/>)", &source);
     EXPECT_EQ(element(u"line_a").getBreakRepresentation(), 3);
     EXPECT_EQ(utf8(element(u"line_a").GetAttribute(u"breakRepresentation")), "wings");
     EXPECT_FALSE(element(u"line_b").isBreakRepresentationPresent()); // not matching
     EXPECT_FALSE(element(u"area_a").isBreakRepresentationPresent());
-
     import(u"c-o-n-t-a-i-n-er", R"(<interpolation missingRepresentation="interpolated"/>)", &source);
     for (const char16_t* id : {u"line_a", u"line_b", u"area_a"})
         EXPECT_EQ(element(id).getBreakRepresentation(), 2) << utf8(id);
@@ -133,35 +135,6 @@ TEST_F(Interpolation, MissingValuesOnlyWhereTheSourceSetsNoBreakRepresentation) 
     EXPECT_EQ(element(u"line_a").getBreakRepresentation(), 1);
     import(u"lineStyle", R"(<interpolation missingRepresentation="dots"/>)", &source);
     EXPECT_EQ(element(u"line_a").getBreakRepresentation(), 1);
-}
-
-TEST_F(Interpolation, MissingValuesNeedASourceHoldingTheElement) {
-    import(u"lineStyle", R"(<interpolation missingRepresentation="gap"/>)");
-    EXPECT_FALSE(element(u"line_a").isBreakRepresentationPresent());
-
-    Chart source = linesAreasAndPaths();
-    GrxBaseElement::wrapperOf<CTElementType>(source.vis->getElementById(u"line_a"))
-        ->setBreakRepresentation(2);
-    import(u"lineStyle", R"(<interpolation missingRepresentation="gap"/>)", &source);
-    EXPECT_FALSE(element(u"line_a").isBreakRepresentationPresent());
-
-    const Chart elsewhere = Chart::empty();
-    import(u"lineStyle", R"(<interpolation missingRepresentation="gap"/>)", &elsewhere);
-    EXPECT_FALSE(element(u"line_a").isBreakRepresentationPresent());
-}
-
-TEST_F(Interpolation, SampleLinesAreSteppedAndTheirSourceBreakKept) {
-    const Chart source = styleimport_test::sample("line-series.xml");
-    Chart chart = styleimport_test::sample("line-series.xml");
-    const DOMElement* e = elements_.make(
-        R"(<style><interpolation type="step" pointPosition="right" missingRepresentation="wings"/></style>)");
-    ASSERT_NE(e, nullptr);
-    Probe(source.vis.get(), *chart.vis, nullptr).importStyle(e, *chart.vis->getStyleById(u"lineStyle"));
-    auto* line = GrxBaseElement::wrapperOf<CTElementType>(chart.vis->getElementById(u"line_1"));
-    ASSERT_NE(line, nullptr);
-    ASSERT_EQ(line->getSmoothStatistics().size(), 1u);
-    EXPECT_EQ(line->getSmoothStatistics().front()->getMethod(), 14);
-    EXPECT_EQ(line->getBreakRepresentation(), 1); // "gap" in the chart's own definition
 }
 
 } // namespace
