@@ -29,14 +29,6 @@ bool inflate(std::string& out, const std::string& packed, long hint) {
     return hint < 0 ? zpack::decompressString(out, packed) : zpack::decompressString(out, packed, hint);
 }
 
-std::string allByteValues(std::size_t repeats) {
-    std::string bytes;
-    for (std::size_t r = 0; r < repeats; ++r)
-        for (int b = 0; b < 256; ++b)
-            bytes += static_cast<char>(b);
-    return bytes;
-}
-
 std::string randomBytes(std::size_t size, unsigned seed) {
     std::mt19937 rng(seed);
     std::string bytes(size, '\0');
@@ -110,8 +102,7 @@ TEST(ZpackRoundTrip, BinaryTextsComeBackByteForByte) {
     const std::string inputs[] = {
         "",
         std::string("a\0b\0\0c", 6),
-        allByteValues(300),
-        randomBytes(100000, 1), // incompressible: output larger than input
+        randomBytes(100000, 1), // every byte value; incompressible: output larger than input
         // Long enough that the tail is measured before it is allocated.
         chartLikeText((std::size_t(64) << 20) + 123457),
     };
@@ -128,11 +119,12 @@ TEST(ZpackRoundTrip, BinaryTextsComeBackByteForByte) {
         EXPECT_TRUE(hinted == input) << input.size();
     }
     // The output may be the input object.
-    std::string s = allByteValues(10);
+    const std::string text = randomBytes(2560, 2);
+    std::string s = text;
     ASSERT_TRUE(zpack::compressString(s, s));
     EXPECT_EQ(static_cast<unsigned char>(s[0]), 0x78);
     ASSERT_TRUE(zpack::decompressString(s, s));
-    EXPECT_EQ(s, allByteValues(10));
+    EXPECT_EQ(s, text);
 }
 
 TEST(ZpackRoundTrip, ReadsPlainZlibWhateverLengthIsClaimed) {
