@@ -1,25 +1,19 @@
 #ifndef PLOTAID_TESTS_TRANSFORMER_SUPPORT_H
 #define PLOTAID_TESTS_TRANSFORMER_SUPPORT_H
 
-#include "foundation/RecordSink.h"
-#include "foundation/ValidatingParser.h"
-#include "foundation/XercesRuntime.h"
+#include "support/EngineSupport.h"
 #include "support/TestSupport.h"
 
 #include <plotaid/ChartTransformer.h>
-#include <plotaid/XmlDataHandler.h>
-
-#include <grx/GrxModel.h>
 
 #include <zpack/zpack.h>
 
-#include <gtest/gtest.h>
-
-#include <memory>
 #include <string>
 #include <vector>
 
 namespace transformer_test {
+
+using TransformerTest = engine_test::EngineTest;
 
 inline std::string example(const std::string& relative) {
     return readAll(std::string(PLOTAID_EXAMPLES_DIR) + "/" + relative);
@@ -37,30 +31,12 @@ inline std::string inflate(const std::string& compressed) {
     return out;
 }
 
-// A parsed document the test owns, wrapped as a visualization (also for data documents: the
-// wrapper only needs a root).
-struct Parsed {
-    std::unique_ptr<GrxVisualization> vis;
-    std::vector<std::string> errors;
-
-    explicit Parsed(const std::string& text) {
-        plotaid::detail::ValidatingParser parser;
-        if (parser.parse(text, "test", ChartException("test document", "transformer_test", 0)) == nullptr) {
-            errors = parser.lastErrors();
-            return;
-        }
-        plotaid::detail::OwnedDocument doc = parser.adoptDocument();
-        vis = std::make_unique<GrxVisualization>(doc.release()->getDocumentElement(), true);
-    }
+// A parsed document the test owns (data documents too: the wrapper only needs a root).
+struct Parsed : engine_test::Chart {
+    explicit Parsed(const std::string& text) : Chart(parse(text)) {}
     bool ok() const { return vis != nullptr; }
     XERCES_CPP_NAMESPACE::DOMElement* root() const { return vis->getImplementation(); }
-    // Local names of the root's element children, in order.
-    std::vector<std::string> childNames() const {
-        std::vector<std::string> names;
-        for (auto* e = root()->getFirstElementChild(); e != nullptr; e = e->getNextElementSibling())
-            names.push_back(ChartString(e->getLocalName()).toUTF8());
-        return names;
-    }
+    // ids of the root's children of that local name, in order.
     std::vector<std::string> idsOf(const char16_t* localName) const {
         std::vector<std::string> ids;
         for (auto* e = root()->getFirstElementChild(); e != nullptr; e = e->getNextElementSibling())
@@ -70,27 +46,15 @@ struct Parsed {
     }
 };
 
-// Error and warning messages logged while it lives.
+// Whether an error or warning logged while it lives contains the text.
 struct Records {
     plotaid::detail::RecordCollector collector;
-    std::vector<std::string> messages() const {
-        std::vector<std::string> out;
-        for (const auto& r : collector.records())
-            out.push_back(r.message);
-        return out;
-    }
     bool mentions(const std::string& part) const {
-        for (const auto& m : messages())
-            if (m.find(part) != std::string::npos)
+        for (const auto& r : collector.records())
+            if (r.message.find(part) != std::string::npos)
                 return true;
         return false;
     }
-};
-
-// Keeps Xerces-C up for documents a test parses outside a transformer.
-class TransformerTest : public ::testing::Test {
-protected:
-    plotaid::detail::XercesRuntime runtime_;
 };
 
 } // namespace transformer_test
