@@ -16,12 +16,30 @@
 
 #include <xercesc/dom/DOM.hpp>
 
+#include <stdexcept>
 #include <string>
 #include <vector>
 
 namespace aesthetics_test {
 
 using engine_test::Chart;
+
+// Keeps Xerces up and every chart the test parses; a chart that does not parse fails the test.
+class AestheticsTest : public engine_test::EngineTest {
+protected:
+    GrxVisualization& parse(const std::string& text) {
+        charts_.push_back(Chart::parse(text));
+        if (!charts_.back().vis)
+            throw std::runtime_error("the chart does not parse");
+        return *charts_.back().vis;
+    }
+    GrxVisualization& sample(const std::string& name) {
+        return parse(engine_test::example("charts/" + name));
+    }
+
+private:
+    std::vector<Chart> charts_;
+};
 
 // A template of the current form around `body`.
 std::string templateOf(const std::string& body);

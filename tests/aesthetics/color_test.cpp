@@ -5,7 +5,6 @@
 #include "templates/actions/aesthetics.h"
 
 using namespace aesthetics_test;
-using engine_test::EngineTest;
 using plotaid::detail::TSetColor;
 
 namespace {
@@ -20,79 +19,68 @@ std::string setColor(const std::string& attributes = std::string()) {
 // Two intervals around a point, each with a colour by var_a on the chart's cycle and a second
 // colour by var_b without one.
 const std::string kTags =
-    "    <interval id='bars_1' coordinates='coordinates_1'>\n"
-    "      <color id='a1' variable='var_a' cycle='chartCycle'/><color id='a2' variable='var_b'/>\n"
-    "    </interval>\n"
-    "    <point id='marks' coordinates='coordinates_1'>\n"
-    "      <color id='m1' variable='var_a' cycle='chartCycle'/>\n"
-    "    </point>\n"
-    "    <interval id='bars_2' coordinates='coordinates_1'>\n"
-    "      <color id='b1' variable='var_a' cycle='chartCycle'/><color id='b2' variable='var_b'/>\n"
-    "    </interval>\n";
+    "<interval id='bars_1' coordinates='coordinates_1'><color id='a1' variable='var_a' cycle='chartCycle'/>"
+    "<color id='a2' variable='var_b'/></interval>"
+    "<point id='marks' coordinates='coordinates_1'><color id='m1' variable='var_a' "
+    "cycle='chartCycle'/></point>"
+    "<interval id='bars_2' coordinates='coordinates_1'><color id='b1' variable='var_a' cycle='chartCycle'/>"
+    "<color id='b2' variable='var_b'/></interval>";
 
-Chart errorBars() {
-    return Chart::parse(engine_test::example("charts/error-bars.xml"));
-}
-
-using SetColor = EngineTest;
+using SetColor = AestheticsTest;
 
 TEST_F(SetColor, EveryColourOfEveryElementGetsTheTemplateCycleAndKeepsTheRest) {
-    Chart chart = errorBars();
-    ASSERT_TRUE(chart.vis);
-    const std::size_t cyclesBefore = chart.vis->getStyleCycles().size();
-    EXPECT_TRUE(applyAction<TSetColor>(setColor(), *chart.vis));
+    GrxVisualization& chart = sample("error-bars.xml");
+    const std::size_t cyclesBefore = chart.getStyleCycles().size();
+    EXPECT_TRUE(applyAction<TSetColor>(setColor(), chart));
     // An interval and a point: different tags, so a new cycle each.
-    EXPECT_EQ(chart.vis->getStyleCycles().size(), cyclesBefore + 2);
+    EXPECT_EQ(chart.getStyleCycles().size(), cyclesBefore + 2);
     for (const char* id : {"color_1", "color_2"}) {
         SCOPED_TRACE(id);
-        EXPECT_EQ(stylesOf(*chart.vis, id), kStyles);
-        EXPECT_EQ(cycleIdOf(*chart.vis, id).rfind("styleCycle", 0), 0u);
-        EXPECT_NE(cycleIdOf(*chart.vis, id), "styleCycleRepository");
-        EXPECT_EQ(attribute(*byId<GrxColor>(*chart.vis, id), "variable"), "var_gender");
-        EXPECT_EQ(attribute(*byId<GrxColor>(*chart.vis, id), "domain"), "domain_gender");
+        EXPECT_EQ(stylesOf(chart, id), kStyles);
+        EXPECT_EQ(cycleIdOf(chart, id).rfind("styleCycle", 0), 0u);
+        EXPECT_NE(cycleIdOf(chart, id), "styleCycleRepository");
+        EXPECT_EQ(attribute(*byId<GrxColor>(chart, id), "variable"), "var_gender");
+        EXPECT_EQ(attribute(*byId<GrxColor>(chart, id), "domain"), "domain_gender");
     }
-    EXPECT_NE(cycleIdOf(*chart.vis, "color_1"), cycleIdOf(*chart.vis, "color_2"));
+    EXPECT_NE(cycleIdOf(chart, "color_1"), cycleIdOf(chart, "color_2"));
     // The chart's own cycle stays: the extension still names it as the chart's repository.
-    EXPECT_NE(byId<GrxStyleCycle>(*chart.vis, "styleCycleRepository"), nullptr);
-    EXPECT_EQ(grammar_test::chartFaults(*chart.vis), "");
+    EXPECT_NE(byId<GrxStyleCycle>(chart, "styleCycleRepository"), nullptr);
+    EXPECT_EQ(grammar_test::chartFaults(chart), "");
 }
 
 TEST_F(SetColor, ElementsOfOneTagShareOneNewCycleAndOtherTagsGetTheirOwn) {
-    Chart chart = Chart::parse(chartWith(kTags));
-    ASSERT_TRUE(chart.vis);
-    EXPECT_TRUE(applyAction<TSetColor>(setColor(), *chart.vis));
-    const std::string bars = cycleIdOf(*chart.vis, "a1");
-    const std::string marks = cycleIdOf(*chart.vis, "m1");
+    GrxVisualization& chart = parse(chartWith(kTags));
+    EXPECT_TRUE(applyAction<TSetColor>(setColor(), chart));
+    const std::string bars = cycleIdOf(chart, "a1");
+    const std::string marks = cycleIdOf(chart, "m1");
     EXPECT_NE(bars, "chartCycle");
     EXPECT_NE(marks, "chartCycle");
     EXPECT_NE(marks, bars);
-    EXPECT_EQ(cycleIdOf(*chart.vis, "b1"), bars);
-    EXPECT_EQ(stylesOf(*chart.vis, "a1"), kStyles);
-    EXPECT_EQ(stylesOf(*chart.vis, "m1"), kStyles);
+    EXPECT_EQ(cycleIdOf(chart, "b1"), bars);
+    EXPECT_EQ(stylesOf(chart, "a1"), kStyles);
+    EXPECT_EQ(stylesOf(chart, "m1"), kStyles);
 }
 
 TEST_F(SetColor, AnAestheticNumberSelectsByPositionAndSharesWithTheSameColourOfAnEarlierElement) {
-    Chart chart = Chart::parse(chartWith(kTags));
-    ASSERT_TRUE(chart.vis);
-    const std::size_t cyclesBefore = chart.vis->getStyleCycles().size();
-    EXPECT_TRUE(applyAction<TSetColor>(setColor("aestheticNumber='2'"), *chart.vis));
+    GrxVisualization& chart = parse(chartWith(kTags));
+    const std::size_t cyclesBefore = chart.getStyleCycles().size();
+    EXPECT_TRUE(applyAction<TSetColor>(setColor("aestheticNumber='2'"), chart));
     // The second bars continue the first bars' new cycle, not the cycle of their first colour.
-    EXPECT_EQ(chart.vis->getStyleCycles().size(), cyclesBefore + 1);
-    EXPECT_EQ(stylesOf(*chart.vis, "a2"), kStyles);
-    EXPECT_EQ(cycleIdOf(*chart.vis, "b2"), cycleIdOf(*chart.vis, "a2"));
+    EXPECT_EQ(chart.getStyleCycles().size(), cyclesBefore + 1);
+    EXPECT_EQ(stylesOf(chart, "a2"), kStyles);
+    EXPECT_EQ(cycleIdOf(chart, "b2"), cycleIdOf(chart, "a2"));
     for (const char* id : {"a1", "b1", "m1"})
-        EXPECT_EQ(cycleIdOf(*chart.vis, id), "chartCycle") << id;
+        EXPECT_EQ(cycleIdOf(chart, id), "chartCycle") << id;
 
     // A number past the list, and an instruction without a cycle, select or change nothing.
-    Chart bars = errorBars();
-    ASSERT_TRUE(bars.vis);
-    const std::string before = bars.vis->AsUTF8();
-    EXPECT_TRUE(applyAction<TSetColor>(setColor("aestheticNumber='2' affect='both'"), *bars.vis));
-    EXPECT_TRUE(applyAction<TSetColor>("<setColor affect='both'/>", *bars.vis));
-    EXPECT_TRUE(applyAction<TSetColor>("<setColor affect='both'><style color='red'/></setColor>", *bars.vis));
-    EXPECT_EQ(bars.vis->AsUTF8(), before);
-    EXPECT_TRUE(applyAction<TSetColor>(setColor("aestheticNumber='1'"), *bars.vis));
-    EXPECT_EQ(stylesOf(*bars.vis, "color_1"), kStyles);
+    GrxVisualization& bars = sample("error-bars.xml");
+    const std::string before = bars.AsUTF8();
+    EXPECT_TRUE(applyAction<TSetColor>(setColor("aestheticNumber='2' affect='both'"), bars));
+    EXPECT_TRUE(applyAction<TSetColor>("<setColor affect='both'/>", bars));
+    EXPECT_TRUE(applyAction<TSetColor>("<setColor affect='both'><style color='red'/></setColor>", bars));
+    EXPECT_EQ(bars.AsUTF8(), before);
+    EXPECT_TRUE(applyAction<TSetColor>(setColor("aestheticNumber='1'"), bars));
+    EXPECT_EQ(stylesOf(bars, "color_1"), kStyles);
 }
 
 TEST_F(SetColor, AffectModesDependOnWhetherTheColourBelongsToAPoint) {
@@ -106,50 +94,47 @@ TEST_F(SetColor, AffectModesDependOnWhetherTheColourBelongsToAPoint) {
          {Case{"main", "main", "secondary"}, Case{"secondary", "secondary", "main"},
           Case{"both", "both", "both"}, Case{"", "secondary", "main"}, Case{"Main", "secondary", "main"}}) {
         SCOPED_TRACE(c.affect);
-        Chart chart = errorBars();
-        ASSERT_TRUE(chart.vis);
+        GrxVisualization& chart = sample("error-bars.xml");
         EXPECT_TRUE(applyAction<TSetColor>(
-            *c.affect ? setColor(std::string("affect='") + c.affect + "'") : setColor(), *chart.vis));
-        EXPECT_EQ(attribute(*byId<GrxColor>(*chart.vis, "color_1"), "affect"), c.interval);
-        EXPECT_EQ(attribute(*byId<GrxColor>(*chart.vis, "color_2"), "affect"), c.point);
+            *c.affect ? setColor(std::string("affect='") + c.affect + "'") : setColor(), chart));
+        EXPECT_EQ(attribute(*byId<GrxColor>(chart, "color_1"), "affect"), c.interval);
+        EXPECT_EQ(attribute(*byId<GrxColor>(chart, "color_2"), "affect"), c.point);
         if (std::string(c.affect) == "main") { // as numbers: 3 on a point's colour, 2 on the interval's
-            EXPECT_EQ(byId<GrxColor>(*chart.vis, "color_1")->getAffect(), 2);
-            EXPECT_EQ(byId<GrxColor>(*chart.vis, "color_2")->getAffect(), 3);
+            EXPECT_EQ(byId<GrxColor>(chart, "color_1")->getAffect(), 2);
+            EXPECT_EQ(byId<GrxColor>(chart, "color_2")->getAffect(), 3);
         }
     }
 }
 
 TEST_F(SetColor, ASourceThatSetsTheCycleKeepsTheColourAsItIs) {
-    Chart chart = errorBars();
-    Chart source = errorBars();
-    ASSERT_TRUE(chart.vis && source.vis);
-    const std::string before = chart.vis->AsUTF8();
-    EXPECT_TRUE(applyAction<TSetColor>(setColor("affect='both'"), *chart.vis, source.vis.get()));
-    EXPECT_EQ(chart.vis->AsUTF8(), before);
+    GrxVisualization& chart = sample("error-bars.xml");
+    GrxVisualization& source = sample("error-bars.xml");
+    const std::string before = chart.AsUTF8();
+    EXPECT_TRUE(applyAction<TSetColor>(setColor("affect='both'"), chart, &source));
+    EXPECT_EQ(chart.AsUTF8(), before);
 
     // Where the source's colour has no cycle of its own, the template decides for that colour only.
-    byId<GrxColor>(*source.vis, "color_2")->removeCycle();
-    EXPECT_TRUE(applyAction<TSetColor>(setColor("affect='both'"), *chart.vis, source.vis.get()));
-    EXPECT_EQ(cycleIdOf(*chart.vis, "color_1"), "styleCycleRepository");
-    EXPECT_EQ(attribute(*byId<GrxColor>(*chart.vis, "color_1"), "affect"), "secondary");
-    EXPECT_EQ(stylesOf(*chart.vis, "color_2"), kStyles);
-    EXPECT_EQ(attribute(*byId<GrxColor>(*chart.vis, "color_2"), "affect"), "both");
+    byId<GrxColor>(source, "color_2")->removeCycle();
+    EXPECT_TRUE(applyAction<TSetColor>(setColor("affect='both'"), chart, &source));
+    EXPECT_EQ(cycleIdOf(chart, "color_1"), "styleCycleRepository");
+    EXPECT_EQ(attribute(*byId<GrxColor>(chart, "color_1"), "affect"), "secondary");
+    EXPECT_EQ(stylesOf(chart, "color_2"), kStyles);
+    EXPECT_EQ(attribute(*byId<GrxColor>(chart, "color_2"), "affect"), "both");
 }
 
 TEST_F(SetColor, AppliedTwiceItIsTheSameChartAsOnceBesidesTheOrphanedCycles) {
-    Chart once = errorBars();
-    Chart twice = errorBars();
-    ASSERT_TRUE(once.vis && twice.vis);
-    applyAction<TSetColor>(setColor("affect='main'"), *once.vis);
-    applyAction<TSetColor>(setColor("affect='main'"), *twice.vis);
-    applyAction<TSetColor>(setColor("affect='main'"), *twice.vis);
-    EXPECT_EQ(canonical(*twice.vis), canonical(*once.vis));
+    GrxVisualization& once = sample("error-bars.xml");
+    GrxVisualization& twice = sample("error-bars.xml");
+    applyAction<TSetColor>(setColor("affect='main'"), once);
+    applyAction<TSetColor>(setColor("affect='main'"), twice);
+    applyAction<TSetColor>(setColor("affect='main'"), twice);
+    EXPECT_EQ(canonical(twice), canonical(once));
     // Each application replaces the references and leaves the cycles it replaced behind.
-    EXPECT_EQ(twice.vis->getStyleCycles().size(), once.vis->getStyleCycles().size() + 2);
-    EXPECT_EQ(orphanedStyleCycles(*twice.vis), orphanedStyleCycles(*once.vis) + 2);
+    EXPECT_EQ(twice.getStyleCycles().size(), once.getStyleCycles().size() + 2);
+    EXPECT_EQ(orphanedStyleCycles(twice), orphanedStyleCycles(once) + 2);
     // ... and a different template really reads differently.
-    applyAction<TSetColor>("<setColor><cycle><style color='#999999'/></cycle></setColor>", *twice.vis);
-    EXPECT_NE(canonical(*twice.vis), canonical(*once.vis));
+    applyAction<TSetColor>("<setColor><cycle><style color='#999999'/></cycle></setColor>", twice);
+    EXPECT_NE(canonical(twice), canonical(once));
 }
 
 } // namespace

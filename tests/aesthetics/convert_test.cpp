@@ -5,7 +5,6 @@
 #include "templates/actions/aesthetics.h"
 
 using namespace aesthetics_test;
-using engine_test::EngineTest;
 
 namespace {
 
@@ -36,7 +35,7 @@ struct ToImage {
     static constexpr std::size_t before = 0;
 };
 
-template <class Kind> class ConvertColours : public EngineTest {
+template <class Kind> class ConvertColours : public AestheticsTest {
 protected:
     static bool apply(GrxVisualization& chart, const std::string& attributes, const std::string& body,
                       const GrxVisualization* source = nullptr) {
@@ -50,15 +49,14 @@ TYPED_TEST_SUITE(ConvertColours, Kinds);
 
 TYPED_TEST(ConvertColours, EveryColourBecomesTheNewAestheticUnderItsId) {
     using A = typename TypeParam::Aesthetic;
-    Chart chart = Chart::parse(kChart);
-    ASSERT_TRUE(chart.vis);
-    EXPECT_TRUE(this->apply(*chart.vis, "", kCycle));
+    GrxVisualization& chart = this->parse(kChart);
+    EXPECT_TRUE(this->apply(chart, "", kCycle));
 
-    EXPECT_TRUE(byId<GrxLine>(*chart.vis, "line_1")->getColors().empty());
-    const std::vector<A*> made = TypeParam::made(*byId<GrxLine>(*chart.vis, "line_1"));
+    EXPECT_TRUE(byId<GrxLine>(chart, "line_1")->getColors().empty());
+    const std::vector<A*> made = TypeParam::made(*byId<GrxLine>(chart, "line_1"));
     ASSERT_EQ(made.size(), TypeParam::before + 2);
-    const A* a = byId<A>(*chart.vis, "colour_a");
-    const A* b = byId<A>(*chart.vis, "colour_b");
+    const A* a = byId<A>(chart, "colour_a");
+    const A* b = byId<A>(chart, "colour_b");
     ASSERT_TRUE(a && b);
     EXPECT_EQ(made[TypeParam::before], a);
     EXPECT_EQ(made[TypeParam::before + 1], b);
@@ -74,44 +72,42 @@ TYPED_TEST(ConvertColours, EveryColourBecomesTheNewAestheticUnderItsId) {
     EXPECT_FALSE(b->isDomainPresent() || b->isMissingPresent());
 
     // A cycle each, with the template's styles.
-    EXPECT_NE(cycleIdOf(*chart.vis, "colour_a"), cycleIdOf(*chart.vis, "colour_b"));
-    EXPECT_EQ(stylesOf(*chart.vis, "colour_a"), "[({stroke-dasharray=3 1;})]");
-    EXPECT_EQ(stylesOf(*chart.vis, "colour_b"), "[({stroke-dasharray=3 1;})]");
+    EXPECT_NE(cycleIdOf(chart, "colour_a"), cycleIdOf(chart, "colour_b"));
+    EXPECT_EQ(stylesOf(chart, "colour_a"), "[({stroke-dasharray=3 1;})]");
+    EXPECT_EQ(stylesOf(chart, "colour_b"), "[({stroke-dasharray=3 1;})]");
 
     // The legend shows what the colours were.
-    EXPECT_EQ(byId<GrxLegendTarget>(*chart.vis, "target_a")->getTarget(), a);
-    EXPECT_EQ(byId<GrxLegendTarget>(*chart.vis, "target_b")->getTarget(), b);
-    EXPECT_EQ(grammar_test::chartFaults(*chart.vis), "");
+    EXPECT_EQ(byId<GrxLegendTarget>(chart, "target_a")->getTarget(), a);
+    EXPECT_EQ(byId<GrxLegendTarget>(chart, "target_b")->getTarget(), b);
+    EXPECT_EQ(grammar_test::chartFaults(chart), "");
 
     // Applied again it finds no colour left.
-    const std::string once = chart.vis->AsUTF8();
-    EXPECT_TRUE(this->apply(*chart.vis, "", kCycle));
-    EXPECT_EQ(chart.vis->AsUTF8(), once);
+    const std::string once = chart.AsUTF8();
+    EXPECT_TRUE(this->apply(chart, "", kCycle));
+    EXPECT_EQ(chart.AsUTF8(), once);
 }
 
 TYPED_TEST(ConvertColours, AnAestheticNumberACycleAndTheSourceSelectWhatIsConverted) {
     using A = typename TypeParam::Aesthetic;
-    Chart chart = Chart::parse(kChart);
-    ASSERT_TRUE(chart.vis);
+    GrxVisualization& chart = this->parse(kChart);
     // Without a cycle nothing changes.
-    const std::string before = chart.vis->AsUTF8();
-    EXPECT_TRUE(this->apply(*chart.vis, "", ""));
-    EXPECT_TRUE(this->apply(*chart.vis, "", "<style stroke-dasharray='3 1'/>"));
-    EXPECT_EQ(chart.vis->AsUTF8(), before);
+    const std::string before = chart.AsUTF8();
+    EXPECT_TRUE(this->apply(chart, "", ""));
+    EXPECT_TRUE(this->apply(chart, "", "<style stroke-dasharray='3 1'/>"));
+    EXPECT_EQ(chart.AsUTF8(), before);
 
-    EXPECT_TRUE(this->apply(*chart.vis, "aestheticNumber='2'", kCycle));
-    const std::vector<GrxColor*> left = byId<GrxLine>(*chart.vis, "line_1")->getColors();
+    EXPECT_TRUE(this->apply(chart, "aestheticNumber='2'", kCycle));
+    const std::vector<GrxColor*> left = byId<GrxLine>(chart, "line_1")->getColors();
     ASSERT_EQ(left.size(), 1u);
     EXPECT_EQ(text(left.front()->getId()), "colour_a");
-    EXPECT_NE(byId<A>(*chart.vis, "colour_b"), nullptr);
+    EXPECT_NE(byId<A>(chart, "colour_b"), nullptr);
 
     // colour_a has a cycle in the source and stays a colour; colour_b has none and is converted.
-    Chart guarded = Chart::parse(kChart);
-    Chart source = Chart::parse(kChart);
-    ASSERT_TRUE(guarded.vis && source.vis);
-    EXPECT_TRUE(this->apply(*guarded.vis, "", kCycle, source.vis.get()));
-    EXPECT_NE(byId<GrxColor>(*guarded.vis, "colour_a"), nullptr);
-    EXPECT_NE(byId<A>(*guarded.vis, "colour_b"), nullptr);
+    GrxVisualization& guarded = this->parse(kChart);
+    GrxVisualization& source = this->parse(kChart);
+    EXPECT_TRUE(this->apply(guarded, "", kCycle, &source));
+    EXPECT_NE(byId<GrxColor>(guarded, "colour_a"), nullptr);
+    EXPECT_NE(byId<A>(guarded, "colour_b"), nullptr);
 }
 
 } // namespace

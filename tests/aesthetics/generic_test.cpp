@@ -5,7 +5,6 @@
 #include "templates/actions/aesthetics.h"
 
 using namespace aesthetics_test;
-using engine_test::EngineTest;
 using plotaid::detail::TSetGenericAttributes;
 using XERCES_CPP_NAMESPACE::DOMElement;
 
@@ -39,14 +38,11 @@ std::string labelText(const GrxVisualization& chart, const char* id) {
     return text(byId<GrxLabel>(chart, id)->getAllText().xc_str());
 }
 
-class SetGenericAttributes : public EngineTest {
+class SetGenericAttributes : public AestheticsTest {
 protected:
-    void SetUp() override {
-        chart_ = Chart::parse(kLabels);
-        ASSERT_TRUE(chart_.vis);
-    }
-    GrxVisualization& chart() { return *chart_.vis; }
-    Chart chart_;
+    void SetUp() override { chart_ = &parse(kLabels); }
+    GrxVisualization& chart() { return *chart_; }
+    GrxVisualization* chart_ = nullptr;
 };
 
 TEST_F(SetGenericAttributes, EveryMatchingNodeTakesTheAttributesButNotTheSelectors) {
@@ -112,11 +108,10 @@ TEST_F(SetGenericAttributes, AStyleNameWritesOnTheReferredStyleOrOnANewLinkedOne
 }
 
 TEST_F(SetGenericAttributes, WithASourceOnlyWhatTheSourceStyleLeavesEmptyIsWritten) {
-    Chart source = Chart::parse(kLabels);
-    ASSERT_TRUE(source.vis);
+    GrxVisualization& source = parse(kLabels);
     EXPECT_TRUE(set(
         chart(), "elementName='label' count='2' styleName='style' color='#FFFFFF' font-size='20pt' text='t'",
-        source.vis.get()));
+        &source));
     // With a source node `text` is an attribute like any other.
     std::string style;
     for (const char* name : {"color", "font-size", "text"})
@@ -143,7 +138,8 @@ TEST_F(SetGenericAttributes, TheInstructionsIdAndQualifiedAttributesStayInTheTem
 }
 
 TEST_F(SetGenericAttributes, StylesMadeOnTheWayAreNotMatchedAgainNorTwice) {
-    const auto* styles = chart_.base().getImplementation()->getElementsByTagName(u"style");
+    const auto* styles =
+        static_cast<const GrxBaseElement&>(chart()).getImplementation()->getElementsByTagName(u"style");
     const XMLSize_t before = styles->getLength();
     ASSERT_GT(before, 0u);
     // Every style without a "textStyle" gets a new one, which is a style without one too.
@@ -153,13 +149,12 @@ TEST_F(SetGenericAttributes, StylesMadeOnTheWayAreNotMatchedAgainNorTwice) {
     EXPECT_EQ(chart().getStyleById(u"c-o-n-t-a-i-n-er")->getStyles().size(), before);
 
     // Applied twice, the same values are written to the same nodes again.
-    Chart once = Chart::parse(kLabels);
-    Chart twice = Chart::parse(kLabels);
-    ASSERT_TRUE(once.vis && twice.vis);
+    GrxVisualization& once = parse(kLabels);
+    GrxVisualization& twice = parse(kLabels);
     const std::string instruction = "elementName='label' styleName='style' color='#0000FF' data-k='v'";
-    for (GrxVisualization* target : {once.vis.get(), twice.vis.get(), twice.vis.get()})
+    for (GrxVisualization* target : {&once, &twice, &twice})
         EXPECT_TRUE(set(*target, instruction));
-    EXPECT_EQ(twice.vis->AsUTF8(), once.vis->AsUTF8());
+    EXPECT_EQ(twice.AsUTF8(), once.AsUTF8());
 }
 
 } // namespace

@@ -5,26 +5,20 @@
 #include "templates/actions/aesthetics.h"
 
 using namespace aesthetics_test;
-using engine_test::EngineTest;
 using plotaid::detail::TSetShowLineMarkers;
 
 namespace {
 
 const std::string kMarkers = "<setShowLineMarkers><style size='6pt' color2='#333333'/></setShowLineMarkers>";
 
-Chart lineSeries() {
-    return Chart::parse(engine_test::example("charts/line-series.xml"));
-}
-
-using SetShowLineMarkers = EngineTest;
+using SetShowLineMarkers = AestheticsTest;
 
 TEST_F(SetShowLineMarkers, ALoneLineGetsPointsThatShowItsSeriesOnce) {
-    Chart chart = lineSeries();
-    ASSERT_TRUE(chart.vis);
-    const std::size_t legendTargets = chart.vis->getLegends().front()->getLegendTargets().size();
-    EXPECT_TRUE(applyAction<TSetShowLineMarkers>(kMarkers, *chart.vis));
+    GrxVisualization& chart = sample("line-series.xml");
+    const std::size_t legendTargets = chart.getLegends().front()->getLegendTargets().size();
+    EXPECT_TRUE(applyAction<TSetShowLineMarkers>(kMarkers, chart));
 
-    GrrUviza& graph = *chart.vis->getGraphs().front();
+    GrrUviza& graph = *chart.getGraphs().front();
     ASSERT_EQ(graph.getPoints().size(), 1u);
     const GrxPoint& point = *graph.getPoints().front();
     EXPECT_EQ(text(point.getId()), "point1");
@@ -44,7 +38,7 @@ TEST_F(SetShowLineMarkers, ALoneLineGetsPointsThatShowItsSeriesOnce) {
         EXPECT_EQ(color->getAffect(), 3);
         EXPECT_EQ(attribute(*color, "variable"), "var_region");
     }
-    EXPECT_EQ(attribute(*byId<GrxColor>(*chart.vis, "color_1"), "affect"), "secondary");
+    EXPECT_EQ(attribute(*byId<GrxColor>(chart, "color_1"), "affect"), "secondary");
 
     // The dash series became a shape series without the dash cycle; no dash is left on the points.
     EXPECT_TRUE(point.getDashs().empty());
@@ -54,7 +48,7 @@ TEST_F(SetShowLineMarkers, ALoneLineGetsPointsThatShowItsSeriesOnce) {
     EXPECT_EQ(attribute(shape, "variable") + " " + attribute(shape, "domain"), "var_region domain_region");
     EXPECT_FALSE(shape.isCyclePresent());
     // ... and the legend shows it.
-    const std::vector<GrxLegendTarget*> targets = chart.vis->getLegends().front()->getLegendTargets();
+    const std::vector<GrxLegendTarget*> targets = chart.getLegends().front()->getLegendTargets();
     ASSERT_EQ(targets.size(), legendTargets + 1);
     EXPECT_EQ(targets.back()->getTarget(), &shape);
     EXPECT_EQ(text(targets.back()->getId()).rfind("legendTarget", 0), 0u);
@@ -62,26 +56,25 @@ TEST_F(SetShowLineMarkers, ALoneLineGetsPointsThatShowItsSeriesOnce) {
     // The line keeps what it had.
     const GrxLine& line = *graph.getLines().front();
     EXPECT_EQ(line.getDashs().size() + line.getColors().size(), 2u);
-    EXPECT_EQ(grammar_test::chartFaults(*chart.vis), "");
+    EXPECT_EQ(grammar_test::chartFaults(chart), "");
 
     // Now the graph holds a line and the markers: no longer a lone line, so nothing more is added.
-    const std::string once = chart.vis->AsUTF8();
-    EXPECT_TRUE(applyAction<TSetShowLineMarkers>(kMarkers, *chart.vis));
-    EXPECT_EQ(chart.vis->AsUTF8(), once);
+    const std::string once = chart.AsUTF8();
+    EXPECT_TRUE(applyAction<TSetShowLineMarkers>(kMarkers, chart));
+    EXPECT_EQ(chart.AsUTF8(), once);
 }
 
 TEST_F(SetShowLineMarkers, ADashScaleAndStatisticGoOverToTheShapeAndNoDashesNoShape) {
-    Chart chart =
-        Chart::parse(chartWith("    <path id='path_1' coordinates='coordinates_1'>\n"
-                               "      <x variable='var_a'/><y variable='var_b'/>\n"
-                               "      <dash id='dash_1' variable='var_a' cycle='chartCycle' name='series'>\n"
-                               "        <scale method='log' base='2'/>\n"
-                               "        <summaryStatistic method='4' variable='var_b'/>\n"
-                               "      </dash>\n"
-                               "    </path>\n"));
-    ASSERT_TRUE(chart.vis);
-    EXPECT_TRUE(applyAction<TSetShowLineMarkers>("<setShowLineMarkers/>", *chart.vis));
-    const std::vector<GrxPoint*> points = chart.vis->getGraphs().front()->getPoints();
+    GrxVisualization& chart =
+        parse(chartWith("    <path id='path_1' coordinates='coordinates_1'>\n"
+                        "      <x variable='var_a'/><y variable='var_b'/>\n"
+                        "      <dash id='dash_1' variable='var_a' cycle='chartCycle' name='series'>\n"
+                        "        <scale method='log' base='2'/>\n"
+                        "        <summaryStatistic method='4' variable='var_b'/>\n"
+                        "      </dash>\n"
+                        "    </path>\n"));
+    EXPECT_TRUE(applyAction<TSetShowLineMarkers>("<setShowLineMarkers/>", chart));
+    const std::vector<GrxPoint*> points = chart.getGraphs().front()->getPoints();
     ASSERT_EQ(points.size(), 1u);
     ASSERT_EQ(points.front()->getShapes().size(), 1u);
     const GrxShape& shape = *points.front()->getShapes().front();
@@ -92,34 +85,31 @@ TEST_F(SetShowLineMarkers, ADashScaleAndStatisticGoOverToTheShapeAndNoDashesNoSh
     // Without a style in the instruction the markers' style stays empty.
     ASSERT_NE(points.front()->getStyle(), nullptr);
     EXPECT_FALSE(points.front()->getStyle()->isSizePresent());
-    EXPECT_EQ(grammar_test::chartFaults(*chart.vis), "");
+    EXPECT_EQ(grammar_test::chartFaults(chart), "");
 
-    Chart plain = Chart::parse(chartWith("    <line id='line_1' coordinates='coordinates_1'>\n"
-                                         "      <color id='c' variable='var_a' cycle='chartCycle'/>\n"
-                                         "    </line>\n"));
-    ASSERT_TRUE(plain.vis);
-    EXPECT_TRUE(applyAction<TSetShowLineMarkers>("<setShowLineMarkers/>", *plain.vis));
-    ASSERT_EQ(plain.vis->getGraphs().front()->getPoints().size(), 1u);
-    EXPECT_TRUE(plain.vis->getGraphs().front()->getPoints().front()->getShapes().empty());
+    GrxVisualization& plain = parse(chartWith("    <line id='line_1' coordinates='coordinates_1'>\n"
+                                              "      <color id='c' variable='var_a' cycle='chartCycle'/>\n"
+                                              "    </line>\n"));
+    EXPECT_TRUE(applyAction<TSetShowLineMarkers>("<setShowLineMarkers/>", plain));
+    ASSERT_EQ(plain.getGraphs().front()->getPoints().size(), 1u);
+    EXPECT_TRUE(plain.getGraphs().front()->getPoints().front()->getShapes().empty());
 }
 
 TEST_F(SetShowLineMarkers, OtherGraphsAreLeftAloneAndWithoutGraphsOrInstructionItFails) {
     for (const char* name : {"charts/dual-y-axis.xml", "charts/simple-bar.xml", "charts/scatter.xml"}) {
         SCOPED_TRACE(name);
-        Chart chart = Chart::parse(engine_test::example(name));
-        ASSERT_TRUE(chart.vis);
-        const std::string before = chart.vis->AsUTF8();
-        EXPECT_TRUE(applyAction<TSetShowLineMarkers>(kMarkers, *chart.vis));
-        EXPECT_EQ(chart.vis->AsUTF8(), before);
+        GrxVisualization& chart = parse(engine_test::example(name));
+        const std::string before = chart.AsUTF8();
+        EXPECT_TRUE(applyAction<TSetShowLineMarkers>(kMarkers, chart));
+        EXPECT_EQ(chart.AsUTF8(), before);
     }
     Chart empty = Chart::empty();
     EXPECT_FALSE(applyAction<TSetShowLineMarkers>(kMarkers, *empty.vis));
-    Chart lines = lineSeries();
-    ASSERT_TRUE(lines.vis);
-    const std::string before = lines.vis->AsUTF8();
-    TSetShowLineMarkers missing(nullptr, *lines.vis, nullptr);
+    GrxVisualization& lines = sample("line-series.xml");
+    const std::string before = lines.AsUTF8();
+    TSetShowLineMarkers missing(nullptr, lines, nullptr);
     EXPECT_FALSE(missing.apply());
-    EXPECT_EQ(lines.vis->AsUTF8(), before);
+    EXPECT_EQ(lines.AsUTF8(), before);
 }
 
 } // namespace

@@ -9,7 +9,6 @@
 #include <fstream>
 
 using namespace aesthetics_test;
-using engine_test::EngineTest;
 using plotaid::detail::InstructionOutcome;
 
 namespace {
@@ -37,86 +36,80 @@ std::string outcomesText(const std::vector<InstructionOutcome>& outcomes) {
     return out;
 }
 
-using AestheticWalk = EngineTest;
+using AestheticWalk = AestheticsTest;
 
 TEST_F(AestheticWalk, EveryTagReachesItsActionThroughTheTemplate) {
     // A line with two colours, a dash and a size, a point with a shape and a pattern, an area whose
     // third colour neither "addDash" (the second) nor "addImage" (the first) converts.
-    Chart chart = Chart::parse(
-        chartWith("    <line id='line_1' coordinates='coordinates_1'>\n"
-                  "      <color id='colour_1' variable='var_a' cycle='chartCycle'/>\n"
-                  "      <color id='colour_2' variable='var_a' cycle='chartCycle'/>\n"
-                  "      <dash id='dash_1' variable='var_a' cycle='chartCycle'/>\n"
-                  "      <size id='size_1' variable='var_b' low='1pt'/>\n"
-                  "    </line>\n"
-                  "    <point id='point_a' coordinates='coordinates_1'>\n"
-                  "      <shape id='shape_a' variable='var_a' cycle='chartCycle'/>\n"
-                  "      <pattern id='pattern_a' variable='var_a' cycle='chartCycle'/>\n"
-                  "    </point>\n"
-                  "    <area id='area_1' coordinates='coordinates_1'>\n"
-                  "      <color id='area_c1' variable='var_a'/><color id='area_c2' variable='var_a'/>\n"
-                  "      <color id='colour_3' variable='var_a' cycle='chartCycle'/>\n"
-                  "    </area>\n",
-                  "  <labelFrame id='frame_1'/>\n"));
-    ASSERT_TRUE(chart.vis);
-    const std::vector<InstructionOutcome> outcomes = applyTemplate(*chart.vis, kReplacing + kConverting);
+    GrxVisualization& chart =
+        parse(chartWith("<line id='line_1' coordinates='coordinates_1'><color id='colour_1' variable='var_a' "
+                        "cycle='chartCycle'/>"
+                        "<color id='colour_2' variable='var_a' cycle='chartCycle'/>"
+                        "<dash id='dash_1' variable='var_a' cycle='chartCycle'/><size id='size_1' "
+                        "variable='var_b' low='1pt'/></line>"
+                        "<point id='point_a' coordinates='coordinates_1'><shape id='shape_a' "
+                        "variable='var_a' cycle='chartCycle'/>"
+                        "<pattern id='pattern_a' variable='var_a' cycle='chartCycle'/></point>"
+                        "<area id='area_1' coordinates='coordinates_1'><color id='area_c1' variable='var_a'/>"
+                        "<color id='area_c2' variable='var_a'/><color id='colour_3' variable='var_a' "
+                        "cycle='chartCycle'/></area>",
+                        "<labelFrame id='frame_1'/>"));
+    const std::vector<InstructionOutcome> outcomes = applyTemplate(chart, kReplacing + kConverting);
     ASSERT_EQ(outcomes.size(), kTags.size()) << outcomesText(outcomes);
     for (std::size_t i = 0; i < kTags.size(); ++i) {
         EXPECT_EQ(outcomes[i].tag, kTags[i]);
         EXPECT_EQ(outcomes[i].kind, InstructionOutcome::Applied) << outcomesText(outcomes);
     }
     // One visible effect per instruction.
-    EXPECT_EQ(stylesOf(*chart.vis, "colour_3"), "[({color=#101010;}{color=#202020;})]");
-    EXPECT_EQ(stylesOf(*chart.vis, "dash_1"), "[({stroke-dasharray=4 2;})]");
-    EXPECT_EQ(stylesOf(*chart.vis, "pattern_a"), "[({pattern=2;})]");
-    EXPECT_EQ(stylesOf(*chart.vis, "shape_a"), "[({symbol=diamond;})]");
-    EXPECT_EQ(byId<GrxSize>(*chart.vis, "size_1")->getLengthMappings().size(), 2u);
-    EXPECT_NE(byId<GrxLabelFrame>(*chart.vis, "frame_1")->getStyle(), nullptr);
-    ASSERT_NE(byId<GrxDash>(*chart.vis, "colour_2"), nullptr);
-    EXPECT_EQ(stylesOf(*chart.vis, "colour_2"), "[({stroke-dasharray=1 1;})]");
-    ASSERT_NE(byId<GrxImage>(*chart.vis, "colour_1"), nullptr);
-    EXPECT_EQ(stylesOf(*chart.vis, "colour_1"), "[({color=#303030;})]");
-    EXPECT_EQ(chart.vis->getGraphs().front()->getPoints().size(), 1u); // not a lone line
-    EXPECT_EQ(grammar_test::chartFaults(*chart.vis), "");
+    EXPECT_EQ(stylesOf(chart, "colour_3"), "[({color=#101010;}{color=#202020;})]");
+    EXPECT_EQ(stylesOf(chart, "dash_1"), "[({stroke-dasharray=4 2;})]");
+    EXPECT_EQ(stylesOf(chart, "pattern_a"), "[({pattern=2;})]");
+    EXPECT_EQ(stylesOf(chart, "shape_a"), "[({symbol=diamond;})]");
+    EXPECT_EQ(byId<GrxSize>(chart, "size_1")->getLengthMappings().size(), 2u);
+    EXPECT_NE(byId<GrxLabelFrame>(chart, "frame_1")->getStyle(), nullptr);
+    ASSERT_NE(byId<GrxDash>(chart, "colour_2"), nullptr);
+    EXPECT_EQ(stylesOf(chart, "colour_2"), "[({stroke-dasharray=1 1;})]");
+    ASSERT_NE(byId<GrxImage>(chart, "colour_1"), nullptr);
+    EXPECT_EQ(stylesOf(chart, "colour_1"), "[({color=#303030;})]");
+    EXPECT_EQ(chart.getGraphs().front()->getPoints().size(), 1u); // not a lone line
+    EXPECT_EQ(grammar_test::chartFaults(chart), "");
 }
 
 TEST_F(AestheticWalk, ASourceGivenToTheTemplateGuardsTheChartsOwnCycles) {
     const std::string text = engine_test::example("charts/line-series.xml");
-    Chart chart = Chart::parse(text);
-    Chart source = Chart::parse(text);
-    ASSERT_TRUE(chart.vis && source.vis);
+    GrxVisualization& chart = parse(text);
+    GrxVisualization& source = parse(text);
     const std::vector<InstructionOutcome> outcomes =
-        applyTemplate(*chart.vis,
+        applyTemplate(chart,
                       "<setColor><cycle><style color='#101010'/></cycle></setColor>"
                       "<setDash><cycle><style stroke-dasharray='4 2'/></cycle></setDash>"
                       "<addDash><cycle><style stroke-dasharray='4 2'/></cycle></addDash>",
-                      source.vis.get());
+                      &source);
     ASSERT_EQ(outcomes.size(), 3u);
-    EXPECT_EQ(cycleIdOf(*chart.vis, "color_1"), "styleCycleColor");
-    EXPECT_EQ(cycleIdOf(*chart.vis, "dash_1"), "styleCycleDash");
-    EXPECT_EQ(chart.vis->AsUTF8(), source.vis->AsUTF8());
+    EXPECT_EQ(cycleIdOf(chart, "color_1"), "styleCycleColor");
+    EXPECT_EQ(cycleIdOf(chart, "dash_1"), "styleCycleDash");
+    EXPECT_EQ(chart.AsUTF8(), source.AsUTF8());
 }
 
 TEST_F(AestheticWalk, EverySampleChartStaysValidAndReplacingTwiceReadsAsOnce) {
     for (const std::string& path : grammar_test::sampleCharts()) {
         SCOPED_TRACE(path);
         const std::string text = grammar_test::readText(path);
-        Chart all = Chart::parse(text);
-        Chart once = Chart::parse(text);
-        Chart twice = Chart::parse(text);
-        ASSERT_TRUE(all.vis && once.vis && twice.vis);
-        const std::vector<InstructionOutcome> outcomes = applyTemplate(*all.vis, kReplacing + kConverting);
+        GrxVisualization& all = parse(text);
+        GrxVisualization& once = parse(text);
+        GrxVisualization& twice = parse(text);
+        const std::vector<InstructionOutcome> outcomes = applyTemplate(all, kReplacing + kConverting);
         for (const InstructionOutcome& o : outcomes)
             EXPECT_EQ(o.kind, InstructionOutcome::Applied) << outcomesText(outcomes);
-        EXPECT_EQ(grammar_test::chartFaults(*all.vis), "");
+        EXPECT_EQ(grammar_test::chartFaults(all), "");
 
-        applyTemplate(*once.vis, kReplacing);
-        applyTemplate(*twice.vis, kReplacing);
-        applyTemplate(*twice.vis, kReplacing);
-        EXPECT_EQ(canonical(*twice.vis), canonical(*once.vis));
+        applyTemplate(once, kReplacing);
+        applyTemplate(twice, kReplacing);
+        applyTemplate(twice, kReplacing);
+        EXPECT_EQ(canonical(twice), canonical(once));
         // What the second application replaced is left behind, referred to by nothing.
-        EXPECT_EQ(twice.vis->getStyleCycles().size() - once.vis->getStyleCycles().size(),
-                  orphanedStyleCycles(*twice.vis) - orphanedStyleCycles(*once.vis));
+        EXPECT_EQ(twice.getStyleCycles().size() - once.getStyleCycles().size(),
+                  orphanedStyleCycles(twice) - orphanedStyleCycles(once));
     }
 }
 
