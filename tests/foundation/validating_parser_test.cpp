@@ -35,11 +35,18 @@ protected:
     TestResources resources;
     DumpFolder dumps{std::string("0000000001")};
     ValidatingParser parser;
+
+    const DOMDocument* parse(const std::string& text) { return parser.parse(text, "ChartBase", kFailure); }
+    std::string errors() const {
+        std::string all;
+        for (const std::string& e : parser.lastErrors())
+            all += e + "\n";
+        return all;
+    }
 };
 
 TEST_F(Parsing, ValidDocumentsAndWrongDataTypeValuesParseWithoutAnyRecord) {
-    const DOMDocument* doc = parser.parse(chart("<item id=\"a\" count=\"3\" percent=\"50\"/><size>4</size>"),
-                                          "ChartBase", kFailure);
+    const DOMDocument* doc = parse(chart("<item id=\"a\" count=\"3\" percent=\"50\"/><size>4</size>"));
     ASSERT_NE(doc, nullptr);
     EXPECT_TRUE(parser.lastErrors().empty());
     // Validation with the schema: the ID attribute is known as such.
@@ -51,7 +58,7 @@ TEST_F(Parsing, ValidDocumentsAndWrongDataTypeValuesParseWithoutAnyRecord) {
     for (const std::string value :
          {"percent=\"101\"", "percent=\"-1\"", "count=\"x\"", "count=\"1.5\"", "weight=\"1.2.3\"",
           "share=\"1..2\"", "visible=\"yes\"", "shape=\"triangle\"", "day=\"2026-13-01\""}) {
-        doc = parser.parse(chart("<item " + value + "/><size>seven</size>"), "ChartBase", kFailure);
+        doc = parse(chart("<item " + value + "/><size>seven</size>"));
         ASSERT_NE(doc, nullptr) << value;
         const auto* item = static_cast<const DOMElement*>(doc->getDocumentElement()->getFirstElementChild());
         const std::string name = value.substr(0, value.find('='));
@@ -60,14 +67,14 @@ TEST_F(Parsing, ValidDocumentsAndWrongDataTypeValuesParseWithoutAnyRecord) {
                   value.substr(name.size() + 2, value.size() - name.size() - 3));
     }
     // Repeated identifiers pass like other value errors.
-    EXPECT_NE(parser.parse(chart("<item id=\"a\"/><item id=\"a\"/>"), "ChartBase", kFailure), nullptr);
+    EXPECT_NE(parse(chart("<item id=\"a\"/><item id=\"a\"/>")), nullptr);
     EXPECT_FALSE(dumps.hasLog()) << dumps.log();
     EXPECT_FALSE(std::filesystem::exists(dumps.dir().file("parseError_00.xml")));
 }
 
 TEST_F(Parsing, UndeclaredElementStopsTheParseWithRecordAndDump) {
     const std::string text = chart("<item/><bogus/>");
-    EXPECT_EQ(parser.parse(text, "ChartBase", kFailure), nullptr);
+    EXPECT_EQ(parse(text), nullptr);
     const std::string log = dumps.log();
     EXPECT_NE(
         log.find(
@@ -85,37 +92,35 @@ TEST_F(Parsing, UndeclaredElementStopsTheParseWithRecordAndDump) {
     // No dump when kind nine is off.
     std::filesystem::remove(dumps.dir().file("parseError_00.xml"));
     ScopedEnv options("DumpChartXMLOptions", "1111111110");
-    EXPECT_EQ(parser.parse(text, "ChartBase", kFailure), nullptr);
+    EXPECT_EQ(parse(text), nullptr);
     EXPECT_FALSE(std::filesystem::exists(dumps.dir().file("parseError_00.xml")));
 }
 
 TEST_F(Parsing, WarningsMalformedTextAndAMissingSchemaFail) {
     // Declares UTF-16 over UTF-8 bytes: the parser warns and carries on, we do not.
-    EXPECT_EQ(parser.parse("<?xml version=\"1.0\" encoding=\"UTF-16\"?>" + chart("").substr(21), "ChartBase",
-                           kFailure),
-              nullptr);
+    EXPECT_EQ(parse("<?xml version=\"1.0\" encoding=\"UTF-16\"?>" + chart("").substr(21)), nullptr);
     EXPECT_NE(dumps.log().find("Warning -- SAX Parser: "), std::string::npos) << dumps.log();
     for (const std::string& text : {std::string("<chart"), std::string(), std::string("\0\0\0", 3)}) {
-        EXPECT_EQ(parser.parse(text, "ChartBase", kFailure), nullptr);
+        EXPECT_EQ(parse(text), nullptr);
         EXPECT_FALSE(parser.lastErrors().empty());
     }
     EXPECT_NE(dumps.log().find("Fatal Error -- SAX Parser:"), std::string::npos);
     TempDir empty;
     ScopedEnv folder("PLOTAID_RESOURCE_DIR", empty.path());
-    EXPECT_EQ(parser.parse(chart("<item/>"), "ChartBase", kFailure), nullptr);
+    EXPECT_EQ(parse(chart("<item/>")), nullptr);
     EXPECT_NE(dumps.log().find("resolveEntity refused"), std::string::npos);
 }
 
 TEST_F(Parsing, ParserIsReusableAndAnAdoptedDocumentOutlivesLaterParses) {
-    EXPECT_EQ(parser.parse(chart("<bogus/>"), "ChartBase", kFailure), nullptr);
+    EXPECT_EQ(parse(chart("<bogus/>")), nullptr);
     EXPECT_EQ(parser.adoptDocument(), nullptr) << "a failed parse has no document to give";
-    ASSERT_NE(parser.parse(chart("<label>kept</label>"), "ChartBase", kFailure), nullptr);
+    ASSERT_NE(parse(chart("<label>kept</label>")), nullptr);
     EXPECT_TRUE(parser.lastErrors().empty());
     plotaid::detail::OwnedDocument mine = parser.adoptDocument();
     ASSERT_NE(mine, nullptr);
     EXPECT_EQ(parser.adoptDocument(), nullptr) << "adopted twice";
-    ASSERT_NE(parser.parse(chart("<label>other</label>"), "ChartBase", kFailure), nullptr);
-    ASSERT_NE(parser.parse(chart("<label>third</label>"), "ChartBase", kFailure), nullptr);
+    ASSERT_NE(parse(chart("<label>other</label>")), nullptr);
+    ASSERT_NE(parse(chart("<label>third</label>")), nullptr);
     EXPECT_EQ(std::u16string(mine->getDocumentElement()->getTextContent()), u"kept");
 }
 
@@ -129,7 +134,7 @@ TEST_F(Parsing, BillionLaughsIsRefused) {
         doctype += "\">";
     }
     doctype += "]>";
-    EXPECT_EQ(parser.parse(chart("<label>&l10;</label>", doctype), "ChartBase", kFailure), nullptr);
+    EXPECT_EQ(parse(chart("<label>&l10;</label>", doctype)), nullptr);
     EXPECT_NE(dumps.log().find(
                   "Fatal Error -- SAX Parser: parser has encountered more than '5000' entity expansions"),
               std::string::npos)
@@ -147,14 +152,13 @@ std::string nestedGroups(std::size_t depth) {
 
 TEST_F(Parsing, NestingIsBoundedWhileDeepTreesStillParse) {
     // The chart element itself is one level.
-    EXPECT_NE(parser.parse(nestedGroups(ValidatingParser::kNestingLimit - 1), "ChartBase", kFailure),
-              nullptr);
-    EXPECT_EQ(parser.parse(nestedGroups(ValidatingParser::kNestingLimit), "ChartBase", kFailure), nullptr);
+    EXPECT_NE(parse(nestedGroups(ValidatingParser::kNestingLimit - 1)), nullptr);
+    EXPECT_EQ(parse(nestedGroups(ValidatingParser::kNestingLimit)), nullptr);
     ASSERT_FALSE(parser.lastErrors().empty());
     EXPECT_NE(parser.lastErrors().front().find("nested more than 1024 deep"), std::string::npos)
         << parser.lastErrors().front();
     // A hostile depth is refused as soon as the limit is passed, not after the whole text.
-    EXPECT_EQ(parser.parse(nestedGroups(200000), "ChartBase", kFailure), nullptr);
+    EXPECT_EQ(parse(nestedGroups(200000)), nullptr);
     EXPECT_NE(dumps.log().find("Fatal Error -- SAX Parser: elements are nested more than"),
               std::string::npos);
 }
@@ -162,22 +166,19 @@ TEST_F(Parsing, NestingIsBoundedWhileDeepTreesStillParse) {
 TEST_F(Parsing, HugeEntityIsRefusedButModestOnesAndReferencesExpand) {
     const std::string big(ValidatingParser::kEntityValueLimit + 1, 'x');
     const std::string refs = "&big;&big;&big;&big;&big;&big;&big;&big;";
-    EXPECT_EQ(
-        parser.parse(chart("<label>" + refs + "</label>", "<!DOCTYPE chart [<!ENTITY big \"" + big + "\">]>"),
-                     "ChartBase", kFailure),
-        nullptr);
+    EXPECT_EQ(parse(chart("<label>" + refs + "</label>", "<!DOCTYPE chart [<!ENTITY big \"" + big + "\">]>")),
+              nullptr);
     EXPECT_NE(dumps.log().find("limit imposed by the application"), std::string::npos);
     const std::string fits(ValidatingParser::kEntityValueLimit, 'y');
-    const DOMDocument* doc = parser.parse(
-        chart("<label>" + refs + "</label>", "<!DOCTYPE chart [<!ENTITY big \"" + fits + "\">]>"),
-        "ChartBase", kFailure);
-    ASSERT_NE(doc, nullptr) << (parser.lastErrors().empty() ? "" : parser.lastErrors()[0]);
+    const DOMDocument* doc =
+        parse(chart("<label>" + refs + "</label>", "<!DOCTYPE chart [<!ENTITY big \"" + fits + "\">]>"));
+    ASSERT_NE(doc, nullptr) << errors();
     EXPECT_EQ(std::u16string(doc->getDocumentElement()->getTextContent()).size(), 8 * fits.size());
     // Predefined and character references are not counted as expansions.
     std::string text;
     for (std::size_t i = 0; i < 2 * ValidatingParser::kEntityExpansionLimit; ++i)
         text += "&amp;&#65;";
-    doc = parser.parse(chart("<label>" + text + "</label>"), "ChartBase", kFailure);
+    doc = parse(chart("<label>" + text + "</label>"));
     ASSERT_NE(doc, nullptr);
     EXPECT_EQ(std::u16string(doc->getDocumentElement()->getTextContent()).size(),
               4 * ValidatingParser::kEntityExpansionLimit);
@@ -199,12 +200,9 @@ TEST_F(Parsing, EntitiesAndDoctypesOutsideTheResourceFolderAreRefused) {
           std::string("<!DOCTYPE chart PUBLIC \"-//Test//EN\" \"http://plotaid.org/marker.dtd\">"),
           "<!DOCTYPE chart [<!ENTITY % outside SYSTEM \"" + dtd + "\"> %outside;]>"}) {
         SCOPED_TRACE(doctype);
-        EXPECT_EQ(parser.parse(chart("<label>&leaked;</label>", doctype), "ChartBase", kFailure), nullptr);
-        std::string errors;
-        for (const std::string& e : parser.lastErrors())
-            errors += e + "\n";
-        EXPECT_NE(errors.find("refused to read"), std::string::npos) << errors;
-        EXPECT_EQ(errors.find("MARKER-OUTSIDE-THE-RESOURCE-FOLDER"), std::string::npos) << errors;
+        EXPECT_EQ(parse(chart("<label>&leaked;</label>", doctype)), nullptr);
+        EXPECT_NE(errors().find("refused to read"), std::string::npos) << errors();
+        EXPECT_EQ(errors().find("MARKER-OUTSIDE-THE-RESOURCE-FOLDER"), std::string::npos) << errors();
     }
     const std::string log = dumps.log();
     EXPECT_NE(log.find("resolveEntity refused"), std::string::npos) << log;
