@@ -36,26 +36,18 @@ protected:
         format_ = &chart_.vis->addSourceVariable().addFormat();
     }
 
-    // A template element in the template namespace; the parser keeps it alive.
-    const DOMElement* element(const std::string& body) {
-        const std::string text = "<w xmlns=\"http://plotaid.org/grxml\">" + body + "</w>";
-        auto parser = std::make_unique<XercesDOMParser>();
-        parser->setDoNamespaces(true);
-        MemBufInputSource source(reinterpret_cast<const XMLByte*>(text.data()), text.size(), "format-test");
-        parser->parse(source);
-        const DOMDocument* document = parser->getDocument();
-        if (document == nullptr || parser->getErrorCount() != 0)
-            return nullptr;
-        parsers_.push_back(std::move(parser));
-        return document->getDocumentElement()->getFirstElementChild();
-    }
-
-    // Imports the element through the operation its tag names.
-    // Date and time parts alone stand for a date-time format of them.
+    // Imports the template element through the operation its tag names; date and time parts
+    // alone stand for a date-time format of them.
     void import(const std::string& body) {
         const bool parts = body.rfind("<dateFormat", 0) == 0 || body.rfind("<timeFormat", 0) == 0;
-        const DOMElement* e = element(parts ? "<dateTimeFormat>" + body + "</dateTimeFormat>" : body);
-        ASSERT_NE(e, nullptr) << body;
+        const std::string text = "<w xmlns=\"http://plotaid.org/grxml\">" +
+                                 (parts ? "<dateTimeFormat>" + body + "</dateTimeFormat>" : body) + "</w>";
+        parsers_.push_back(std::make_unique<XercesDOMParser>());
+        parsers_.back()->setDoNamespaces(true);
+        MemBufInputSource source(reinterpret_cast<const XMLByte*>(text.data()), text.size(), "format-test");
+        parsers_.back()->parse(source);
+        ASSERT_EQ(parsers_.back()->getErrorCount(), 0u) << body;
+        const DOMElement* e = parsers_.back()->getDocument()->getDocumentElement()->getFirstElementChild();
         const std::string tag = utf8(e->getLocalName());
         Probe probe(nullptr, *chart_.vis, nullptr);
         if (tag == "numberFormat")
