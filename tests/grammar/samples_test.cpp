@@ -5,14 +5,17 @@
 
 #include "foundation/ValidatingParser.h"
 
+#include <grx/ChartString.h>
+
 #include <xercesc/dom/DOMAttr.hpp>
 #include <xercesc/dom/DOMDocument.hpp>
 #include <xercesc/dom/DOMElement.hpp>
 #include <xercesc/dom/DOMNamedNodeMap.hpp>
 #include <xercesc/dom/DOMNodeList.hpp>
-#include <xercesc/util/TransService.hpp>
 
 #include <gtest/gtest.h>
+
+#include <algorithm>
 
 using namespace grammar_test;
 using namespace XERCES_CPP_NAMESPACE;
@@ -20,10 +23,7 @@ using namespace XERCES_CPP_NAMESPACE;
 namespace {
 
 std::string utf8(const XMLCh* text) {
-    if (text == nullptr)
-        return std::string();
-    TranscodeToStr converted(text, "UTF-8");
-    return std::string(reinterpret_cast<const char*>(converted.str()), converted.length());
+    return ChartString(text).toUTF8();
 }
 
 std::u16string wide(const std::string& ascii) {
@@ -46,15 +46,8 @@ std::string tagOf(const DOMElement* e) {
     return e ? utf8(e->getLocalName()) : std::string("(none)");
 }
 
-std::vector<std::string> split(const std::string& text) {
-    std::vector<std::string> fields(1);
-    for (char c : text) {
-        if (c == ';')
-            fields.emplace_back();
-        else
-            fields.back() += c;
-    }
-    return fields;
+std::size_t fieldCount(const std::string& row) {
+    return std::count(row.begin(), row.end(), ';') + 1;
 }
 
 bool listed(const std::string& words, const std::string& word) {
@@ -142,11 +135,11 @@ TEST_F(SampleCharts, AreCompleteAndEveryReferenceResolves) {
         ASSERT_FALSE(sources.empty());
         for (const DOMElement* source : sources) {
             const std::size_t names =
-                split(utf8(source->getElementsByTagNameNS(u"*", u"names")->item(0)->getTextContent())).size();
+                fieldCount(utf8(source->getElementsByTagNameNS(u"*", u"names")->item(0)->getTextContent()));
             const DOMNodeList* rows = source->getElementsByTagNameNS(u"*", u"row");
             ASSERT_GT(rows->getLength(), 0u);
             for (XMLSize_t r = 0; r < rows->getLength(); ++r)
-                EXPECT_EQ(split(utf8(rows->item(r)->getTextContent())).size(), names) << "row " << r;
+                EXPECT_EQ(fieldCount(utf8(rows->item(r)->getTextContent())), names) << "row " << r;
         }
     }
 }
