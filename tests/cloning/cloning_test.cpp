@@ -6,6 +6,8 @@
 
 #include <xercesc/dom/DOM.hpp>
 
+#include <sstream>
+
 using engine_test::Chart;
 using engine_test::EngineTest;
 
@@ -211,7 +213,7 @@ TEST_F(Cloning, APointOntoAPointKeepsShapesMappingsScalesStatisticsAndStyledCond
     EXPECT_EQ(conditions[0]->getStyle(), &style);
 }
 
-TEST_F(Cloning, OntoALabelingOnlyStyleBysComponentsColoursAndSizes) {
+TEST_F(Cloning, OntoALabelingOnlyStyleBysComponentsColoursAndSizesAndSizesGetTheElementDefaults) {
     point_->addStyleBy().setVariable(*point_->getColors()[0]->getVariable());
     point_->addColorComponent().setType(1);
     point_->addDash();
@@ -236,10 +238,8 @@ TEST_F(Cloning, OntoALabelingOnlyStyleBysComponentsColoursAndSizes) {
     EXPECT_TRUE(startsWith(utf8(labeling.getColorComponents()[0]->getId()), "colorComponent"));
     EXPECT_TRUE(startsWith(utf8(labeling.getStyleBys()[0]->getId()), "styleBy"));
     EXPECT_EQ(grammar_test::chartFaults(*chart_.vis), "");
-}
 
-TEST_F(Cloning, SizesWithoutBoundsGetTheElementDefaults) {
-    point_->addSize();
+    // Onto an interval, a size without bounds gets the interval's; one with a bound keeps it alone.
     point_->addSize().setLow(u"1pt");
     GrxInterval& interval = graph_->addInterval();
     probe().cloneElementAesthetics(*point_, interval, false);
@@ -344,17 +344,19 @@ TEST_F(Cloning, AStyleCycleOfTheElementKeepsOnlyColoursSwappedFromAPoint) {
 }
 
 TEST_F(Cloning, ColourTwoReplacesColourWhereUnsetOrForcedAndColoursTurnMain) {
-    // A style cycle with one style per (colour, colour 2) pair; null leaves one out.
-    const auto cycleOf =
-        [&](std::initializer_list<std::pair<const XMLCh*, const XMLCh*>> pairs) -> GrxStyleCycle& {
+    // A style cycle with one style per "colour/colour2" word; "-" leaves one out.
+    const auto cycleOf = [&](const std::string& words) -> GrxStyleCycle& {
         GrxStyleCycle& sc = chart_.vis->addStyleCycle(probe().CreateUniqueId(ChartString("swap")));
         GrxCycle& cycle = sc.addCycle();
-        for (const auto& [colour, colour2] : pairs) {
+        std::istringstream in(words);
+        for (std::string word; in >> word;) {
             GrxStyle& s = cycle.addStyle();
-            if (colour != nullptr)
-                s.setColor(colour);
-            if (colour2 != nullptr)
-                s.setColor2(colour2);
+            const std::string colour = word.substr(0, word.find('/')),
+                              colour2 = word.substr(word.find('/') + 1);
+            if (colour != "-")
+                s.setColor(ChartString(colour).xc_str());
+            if (colour2 != "-")
+                s.setColor2(ChartString(colour2).xc_str());
         }
         return sc;
     };
@@ -365,11 +367,7 @@ TEST_F(Cloning, ColourTwoReplacesColourWhereUnsetOrForcedAndColoursTurnMain) {
         return out;
     };
     // Without force explicit colours stay; colour 2 itself stays too.
-    GrxStyleCycle& sc = cycleOf({{u"red", u"blue"},
-                                 {u"transparent", nullptr},
-                                 {nullptr, u"green"},
-                                 {u"transparent", u"transparent"},
-                                 {nullptr, nullptr}});
+    GrxStyleCycle& sc = cycleOf("red/blue transparent/- -/green transparent/transparent -/-");
     GrxLine& line = graph_->addLine();
     line.addStyleBy().setCycle(sc);
     line.addStyleBy(); // without a cycle: counted, nothing to change
@@ -386,7 +384,7 @@ TEST_F(Cloning, ColourTwoReplacesColourWhereUnsetOrForcedAndColoursTurnMain) {
     EXPECT_EQ(secondary.getAffect(), 2);
 
     // With force every style takes its colour 2; the element's own colour is not the labeling's.
-    GrxStyleCycle& forced = cycleOf({{u"red", u"blue"}, {u"white", nullptr}, {u"red", u"transparent"}});
+    GrxStyleCycle& forced = cycleOf("red/blue white/- red/transparent");
     GrxLabeling& labeling = point_->addLabeling();
     labeling.addStyleBy().setCycle(forced);
     GrxColor& colour = labeling.addColor();
