@@ -46,195 +46,159 @@ std::string bar(const std::string& id, const std::string& style, const std::stri
 
 using ElementTypes = SetStyleTest;
 
-TEST_F(ElementTypes, OneUnnumberedDeclarationStylesTheBarsOfEveryNonPolarGraph) {
-    Chart chart = load(chartWith(
-        {{"g1", bar("b1", "s1")}, {"g2", bar("b2", "s2")}, {"g3", bar("b3", "s3"), /*polar=*/true}}));
-    const auto before = styleSnapshot(chart);
-    EXPECT_TRUE(apply(chart, "<setStyle type=\"bar\"><style color=\"red\"/></setStyle>"));
-    EXPECT_EQ(attr(styleById(chart, "s1"), "color"), "red");
-    EXPECT_EQ(attr(styleById(chart, "s2"), "color"), "red");
-    EXPECT_EQ(attr(styleById(chart, "s3"), "color"), "black");
-    EXPECT_EQ(changedStyles(before, styleSnapshot(chart)), (std::vector<std::string>{"s1", "s2"}));
-}
-
-TEST_F(ElementTypes, NumberedDeclarationsStyleTheGraphOfTheirNumberOnly) {
-    const std::string text =
+TEST_F(ElementTypes, DeclarationsReachTheGraphsOfTheirNumber) {
+    const std::string three =
         chartWith({{"g1", bar("b1", "s1")}, {"g2", bar("b2", "s2")}, {"g3", bar("b3", "s3")}});
-    Chart chart = load(text);
-    EXPECT_TRUE(apply(chart, "<setStyle type=\"bar\"><style number=\"0\" color=\"red\"/>"
-                             "<style number=\"1\" color=\"blue\"/></setStyle>"));
-    EXPECT_EQ(attr(styleById(chart, "s1"), "color"), "red");
-    EXPECT_EQ(attr(styleById(chart, "s2"), "color"), "blue");
-    EXPECT_EQ(attr(styleById(chart, "s3"), "color"), "black");
-
+    // One unnumbered declaration is for every graph, but not a polar one.
+    expectStyles(chartWith({{"g1", bar("b1", "s1")}, {"g2", bar("b2", "s2")}, {"g3", bar("b3", "s3"), true}}),
+                 setStyle("bar", kRed), "s1:red s2:red", "s1 s2");
+    expectStyles(three,
+                 setStyle("bar", "<style number=\"0\" color=\"red\"/><style number=\"1\" color=\"blue\"/>"),
+                 "s1:red s2:blue s3:black");
     // A lone declaration with a number is no longer the one for every graph.
-    Chart second = load(text);
-    EXPECT_TRUE(apply(second, "<setStyle type=\"bar\"><style number=\"1\" color=\"blue\"/></setStyle>"));
-    EXPECT_EQ(attr(styleById(second, "s1"), "color"), "black");
-    EXPECT_EQ(attr(styleById(second, "s2"), "color"), "blue");
-    EXPECT_EQ(attr(styleById(second, "s3"), "color"), "black");
-
+    expectStyles(three, setStyle("bar", "<style number=\"1\" color=\"blue\"/>"), "s1:black s2:blue s3:black");
     // A later declaration of the same number replaces the earlier one.
-    Chart third = load(text);
-    EXPECT_TRUE(apply(third, "<setStyle type=\"bar\"><style color=\"red\"/><style number=\"0\" "
-                             "color=\"green\"/></setStyle>"));
-    EXPECT_EQ(attr(styleById(third, "s3"), "color"), "green");
+    expectStyles(three, setStyle("bar", "<style color=\"red\"/><style number=\"0\" color=\"green\"/>"),
+                 "s3:green");
+    // Huge numbers name no graph and cost nothing: the unnumbered declaration is graph 0's only.
+    for (const char* number : {"4294967295", "-1", "99999999999999"})
+        expectStyles(chartWith({{"g1", bar("b1", "s1")}, {"g2", bar("b2", "s2")}}),
+                     setStyle("bar", std::string(kRed) + "<style number=\"" + number + "\" color=\"blue\"/>"),
+                     "s1:red s2:black");
+    // Declarations beyond the graphs, unknown types and no declaration change nothing.
+    for (const std::string& body :
+         {setStyle("interval", kRed), setStyle("bar", "<style number=\"3\" color=\"red\"/>"),
+          setStyle("bar", "")})
+        expectStyles("simple-bar.xml", body, "", "");
+    // A simple bar chart changes only its bar style, and only what the declaration says.
+    expectStyles("simple-bar.xml", setStyle("bar", "<style color=\"#112233\" stroke-width=\"2pt\"/>"),
+                 "barStyle:#112233 barStyle.stroke-width:2pt barStyle.width:60%;10%;90%", "barStyle");
 }
 
-TEST_F(ElementTypes, HugeDeclarationNumbersNameNoGraphAndCostNothing) {
-    const std::string text = chartWith({{"g1", bar("b1", "s1")}, {"g2", bar("b2", "s2")}});
-    for (const char* number : {"4294967295", "-1", "99999999999999"}) {
-        Chart chart = load(text);
-        EXPECT_TRUE(
-            apply(chart, std::string("<setStyle type=\"bar\"><style color=\"red\"/><style number=\"") +
-                             number + "\" color=\"blue\"/></setStyle>"));
-        // Two declarations: the unnumbered one is graph 0's only.
-        EXPECT_EQ(attr(styleById(chart, "s1"), "color"), "red") << number;
-        EXPECT_EQ(attr(styleById(chart, "s2"), "color"), "black") << number;
-    }
-}
-
-TEST_F(ElementTypes, ClusteredAndPlainBarsTakeTheirOwnSubtype) {
-    for (const std::string name : {"clustered-bar.xml", "simple-bar.xml"}) {
-        const bool clusteredChart = name == "clustered-bar.xml";
-        Chart plain = sample(name);
-        apply(plain, "<setStyle type=\"bar\"><style color=\"red\"/></setStyle>");
-        EXPECT_EQ(attr(styleById(plain, "barStyle"), "color") == "red", !clusteredChart) << name;
-        Chart clustered = sample(name);
-        apply(clustered, "<setStyle type=\"bar\" subtype=\"clustered\"><style color=\"red\"/></setStyle>");
-        EXPECT_EQ(attr(styleById(clustered, "barStyle"), "color") == "red", clusteredChart) << name;
-    }
-    // Position modifier 7 keeps an unclustered bar out, and only that bar.
-    Chart chart = load(chartWith({{"g1", bar("b1", "s1", " positionModifier=\"7\"") + bar("b2", "s2")}}));
-    apply(chart, "<setStyle type=\"bar\"><style color=\"red\"/></setStyle>");
-    EXPECT_EQ(attr(styleById(chart, "s1"), "color"), "black");
-    EXPECT_EQ(attr(styleById(chart, "s2"), "color"), "red");
-    // ... but not a clustered one.
-    Chart clustered =
-        load(chartWith({{"g1", bar("b1", "s1", " positionModifier=\"7\""), false, false, true}}));
-    apply(clustered, "<setStyle type=\"bar\" subtype=\"clustered\"><style color=\"red\"/></setStyle>");
-    EXPECT_EQ(attr(styleById(clustered, "s1"), "color"), "red");
-}
-
-TEST_F(ElementTypes, IntervalsDrawnAsLinesAreDropLinesAndErrorBarsNeverBars) {
-    const std::string text =
-        chartWith({{"g1", bar("b1", "s1")}}, "<style id=\"lineSymbol\" symbol=\"line\" color=\"black\"/>");
-    const std::string lined = replaced(text, "style=\"s1\"", "style=\"lineSymbol\"");
-    for (const char* type : {"dropline", "errorbar", "bar"}) {
-        Chart chart = load(lined);
-        apply(chart, std::string("<setStyle type=\"") + type + "\"><style color=\"red\"/></setStyle>");
-        EXPECT_EQ(attr(styleById(chart, "lineSymbol"), "color"), std::string(type) == "bar" ? "black" : "red")
-            << type;
-    }
-    // I-beams take error bar styles only.
-    for (const char* type : {"errorbar", "dropline", "bar", "range"}) {
-        Chart chart = sample("error-bars.xml");
-        apply(chart, std::string("<setStyle type=\"") + type + "\"><style color=\"red\"/></setStyle>");
-        EXPECT_EQ(attr(styleById(chart, "errorbarStyle"), "color") == "red", std::string(type) == "errorbar")
-            << type;
-    }
-}
-
-TEST_F(ElementTypes, IdsNameTheirIntervalsKind) {
-    const std::string text =
+TEST_F(ElementTypes, EachKindOfElementTakesItsOwnType) {
+    const std::string posMod = " positionModifier=\"7\"";
+    const std::string lined = replaceOnce(
+        chartWith({{"g1", bar("b1", "s1")}}, "<style id=\"lineSymbol\" symbol=\"line\" color=\"black\"/>"),
+        "style=\"s1\"", "style=\"lineSymbol\"");
+    const std::string named =
         chartWith({{"g1", bar("my_dropdownline", "s1") + bar("an_errorbar", "s2") + bar("plain", "s3")}});
-    Chart drop = load(text);
-    apply(drop, "<setStyle type=\"dropline\"><style color=\"red\"/></setStyle>");
-    EXPECT_EQ(attr(styleById(drop, "s1"), "color"), "red");
-    EXPECT_EQ(attr(styleById(drop, "s2"), "color"), "black");
-    EXPECT_EQ(attr(styleById(drop, "s3"), "color"), "black");
-    // Under "bar" the named ones go on to the bar rule like any other bar.
-    Chart bars = load(text);
-    apply(bars, "<setStyle type=\"bar\"><style color=\"red\"/></setStyle>");
-    EXPECT_EQ(attr(styleById(bars, "s1"), "color"), "red");
-    EXPECT_EQ(attr(styleById(bars, "s2"), "color"), "red");
-    EXPECT_EQ(attr(styleById(bars, "s3"), "color"), "red");
-}
-
-TEST_F(ElementTypes, SpecialChartElementsAreNeverStyled) {
-    std::string elements;
+    const std::string points =
+        chartWith({{"g1", "<point id=\"plain\" style=\"s1\" coordinates=\"COORD\"/>"
+                          "<point id=\"binned\" style=\"s2\" coordinates=\"COORD\"><binStatistic/></point>"
+                          "<line id=\"line\" style=\"s3\" coordinates=\"COORD\"/>"}});
+    const std::string ranges = chartWith(
+        {{"g1",
+          "<interval id=\"r1\" style=\"sq\" coordinates=\"COORD\"><summaryStatistic method=\"7\"/></interval>"
+          "<interval id=\"r2\" style=\"s2\" coordinates=\"COORD\"><summaryStatistic "
+          "method=\"7\"/></interval>"}},
+        "<style id=\"sq\" symbol=\"square\" color=\"black\"/>");
+    std::string special;
     const char* ids[] = {"series_1", "my_control", "AIMx",     "biplot1",
                          "centroid", "guide1",     "survival", "triplot"};
     for (int i = 0; i < 8; ++i)
-        elements += bar(ids[i], "s" + std::to_string(i + 1));
-    elements += bar("ordinary", "s9");
-    Chart chart = load(chartWith({{"g1", elements}}));
-    const auto before = styleSnapshot(chart);
-    apply(chart, "<setStyle type=\"bar\"><style color=\"red\"/></setStyle>");
-    EXPECT_EQ(changedStyles(before, styleSnapshot(chart)), (std::vector<std::string>{"s9"}));
+        special += bar(ids[i], "s" + std::to_string(i + 1));
+    const struct {
+        std::string chart, body, expect;
+        const char* changed;
+    } rows[] = {
+        // Clustered and plain bars take their own subtype.
+        {"simple-bar.xml", setStyle("bar", kRed), "barStyle:red", nullptr},
+        {"clustered-bar.xml", setStyle("bar", kRed), "barStyle:!red", nullptr},
+        {"simple-bar.xml", setStyle("bar", kRed, sub("clustered")), "barStyle:!red", nullptr},
+        {"clustered-bar.xml", setStyle("bar", kRed, sub("clustered")), "barStyle:red", nullptr},
+        // Position modifier 7 keeps an unclustered bar out, but not a clustered one.
+        {chartWith({{"g1", bar("b1", "s1", posMod) + bar("b2", "s2")}}), setStyle("bar", kRed),
+         "s1:black s2:red", nullptr},
+        {chartWith({{"g1", bar("b1", "s1", posMod), false, false, true}}),
+         setStyle("bar", kRed, sub("clustered")), "s1:red", nullptr},
+        // Intervals drawn as lines are drop lines and error bars, never bars; I-beams error bars only.
+        {lined, setStyle("dropline", kRed), "lineSymbol:red", nullptr},
+        {lined, setStyle("errorbar", kRed), "lineSymbol:red", nullptr},
+        {lined, setStyle("bar", kRed), "lineSymbol:black", nullptr},
+        {"error-bars.xml", setStyle("errorbar", kRed), "errorbarStyle:red", nullptr},
+        {"error-bars.xml", setStyle("dropline", kRed), "errorbarStyle:!red", nullptr},
+        {"error-bars.xml", setStyle("bar", kRed), "errorbarStyle:!red", nullptr},
+        {"error-bars.xml", setStyle("range", kRed), "errorbarStyle:!red", nullptr},
+        // Ids name their interval's kind; under "bar" the named ones are bars like any other.
+        {named, setStyle("dropline", kRed), "s1:red s2:black s3:black", nullptr},
+        {named, setStyle("bar", kRed), "s1:red s2:red s3:red", nullptr},
+        // Special chart elements are never styled.
+        {chartWith({{"g1", special + bar("ordinary", "s9")}}), setStyle("bar", kRed), "s9:red", "s9"},
+        {chartWith({{"g1", "<line id=\"series_line\" style=\"s1\" coordinates=\"COORD\"/>"
+                           "<line id=\"line\" style=\"s2\" coordinates=\"COORD\"/>"}}),
+         setStyle("line", kRed), "s1:black s2:red", nullptr},
+        // Scatter points with bins take only the dot subtype.
+        {points, setStyle("scatter", kRed), "s1:red s2:black s3:black", nullptr},
+        {points, setStyle("scatter", kRed, sub("dot")), "s2:red", nullptr},
+        {"scatter.xml", setStyle("scatter", kRed), "pointStyle:red", nullptr},
+        // Areas, histograms (bins and summaries: no plain bars) and ranges.
+        {"area.xml", setStyle("area", kRed), "areaStyle:red", nullptr},
+        {"histogram.xml", setStyle("bar", kRed), "barStyle:!red", nullptr},
+        {"histogram.xml", setStyle("histogram", kRed), "barStyle:red normalLineStyle:!red", nullptr},
+        {ranges, setStyle("range", kRed), "sq:red s2:black", nullptr},
+        // Schema parts take their own styles; an unknown part the box's own.
+        {"boxplot.xml", setStyle("schema", kRed, sub("hingeStyle")), "hingeStyle:red", "hingeStyle"},
+        {"boxplot.xml", setStyle("schema", kRed, sub("whatever")), "boxStyle:red", nullptr},
+        // The coordinate attribute chooses the coordinates.
+        {"dual-y-axis.xml", setStyle("line", "<style coordinate=\"1\" color=\"red\"/>"), "lineStyle:red",
+         nullptr},
+        {"dual-y-axis.xml", setStyle("line", "<style coordinate=\"0\" color=\"red\"/>"), "", ""},
+        {"dual-y-axis.xml", setStyle("bar", "<style coordinate=\"1\" color=\"red\"/>"), "barStyle:!red",
+         nullptr},
+        // Patterned bars without a colour are whitened.
+        {chartWith(
+             {{"g1",
+               "<interval id=\"b1\" style=\"bare\" coordinates=\"COORD\"><styleBy "
+               "id=\"pattern_1\"/></interval>"
+               "<interval id=\"b2\" style=\"s2\" coordinates=\"COORD\"><styleBy id=\"pattern_2\"/></interval>"
+               "<interval id=\"b3\" style=\"bare2\" coordinates=\"COORD\"><styleBy "
+               "id=\"dash_1\"/></interval>"}},
+             "<style id=\"bare\"/><style id=\"bare2\"/>"),
+         setStyle("bar", "<style stroke-width=\"2pt\"/>"),
+         "bare:white s2:black bare2:- bare2.stroke-width:2pt", nullptr},
+    };
+    for (const auto& row : rows)
+        expectStyles(row.chart, row.body, row.expect, row.changed);
+}
 
-    // The same for lines.
-    Chart lines = load(chartWith({{"g1", "<line id=\"series_line\" style=\"s1\" coordinates=\"COORD\"/>"
-                                         "<line id=\"line\" style=\"s2\" coordinates=\"COORD\"/>"}}));
-    apply(lines, "<setStyle type=\"line\"><style color=\"red\"/></setStyle>");
-    EXPECT_EQ(attr(styleById(lines, "s1"), "color"), "black");
-    EXPECT_EQ(attr(styleById(lines, "s2"), "color"), "red");
+TEST_F(ElementTypes, ThreeDimensionalLinesAreStyledOnlyUnderThe3DSubtype) {
+    auto elements = [](const std::string& prefix, int first) {
+        std::string out;
+        for (const char* kind : {"line", "path", "edge"})
+            out += std::string("<") + kind + " id=\"" + prefix + kind + "\" style=\"s" +
+                   std::to_string(first++) + "\" coordinates=\"COORD\"/>";
+        return out;
+    };
+    const std::string text = chartWith({{"flat", elements("f", 1)}, {"deep", elements("d", 4), false, true}});
+    expectStyles(text, setStyle("line", kRed, sub("3D")), "s1:black s2:black s3:black s4:red s5:red s6:red");
+    expectStyles(text, setStyle("line", kRed), "s1:red s2:red s3:red s4:black s5:black s6:black");
 }
 
 TEST_F(ElementTypes, PieSlicesTakeTheDeclarationWithTheSizeRuleWrittenBack) {
     Chart chart = sample("pie.xml");
-    const std::string body =
-        "<setStyle type=\"pie\"><style color=\"red\" size=\"30%\" width=\"50%\"/></setStyle>";
-    EXPECT_TRUE(apply(chart, body));
-    GrxStyle* slice = styleById(chart, "sliceStyle");
-    EXPECT_EQ(attr(slice, "color"), "red");
-    EXPECT_EQ(attr(slice, "width"), "100%");
+    EXPECT_TRUE(apply(chart, setStyle("pie", "<style color=\"red\" size=\"30%\" width=\"50%\"/>")));
+    EXPECT_EQ(attr(styleById(chart, "sliceStyle"), "color"), "red");
+    EXPECT_EQ(attr(styleById(chart, "sliceStyle"), "width"), "100%");
     // The template's own declaration was rewritten.
-    const XERCES_CPP_NAMESPACE::DOMElement* declaration = template_.instruction(0)->getFirstElementChild();
+    const XERCES_CPP_NAMESPACE::DOMElement* declaration = template_.first()->getFirstElementChild();
     EXPECT_FALSE(declaration->hasAttribute(u"size"));
     EXPECT_EQ(utf8(declaration->getAttribute(u"width")), "100%");
-
-    // Without a width none is added; bars of a pie take nothing.
+    // Without a width none is added; bars of a pie take nothing and leave the declaration be.
     Chart noWidth = sample("pie.xml");
-    apply(noWidth, "<setStyle type=\"pie\"><style color=\"red\" size=\"30%\"/></setStyle>");
-    EXPECT_FALSE(template_.instruction(0)->getFirstElementChild()->hasAttribute(u"width"));
-    EXPECT_FALSE(template_.instruction(0)->getFirstElementChild()->hasAttribute(u"size"));
-    Chart asBars = sample("pie.xml");
-    const auto before = styleSnapshot(asBars);
-    apply(asBars, "<setStyle type=\"bar\"><style color=\"red\" size=\"30%\"/></setStyle>");
-    EXPECT_TRUE(changedStyles(before, styleSnapshot(asBars)).empty());
-    EXPECT_TRUE(template_.instruction(0)->getFirstElementChild()->hasAttribute(u"size"));
+    apply(noWidth, setStyle("pie", "<style color=\"red\" size=\"30%\"/>"));
+    EXPECT_FALSE(template_.first()->getFirstElementChild()->hasAttribute(u"width"));
+    EXPECT_FALSE(template_.first()->getFirstElementChild()->hasAttribute(u"size"));
+    expectStyles("pie.xml", setStyle("bar", "<style color=\"red\" size=\"30%\"/>"), "", "");
+    EXPECT_TRUE(template_.first()->getFirstElementChild()->hasAttribute(u"size"));
 }
 
-TEST_F(ElementTypes, ThreeDimensionalLinesAreStyledOnlyUnderThe3DSubtype) {
-    const std::string elements = "<line id=\"l\" style=\"S1\" coordinates=\"COORD\"/>"
-                                 "<path id=\"p\" style=\"S2\" coordinates=\"COORD\"/>"
-                                 "<edge id=\"e\" style=\"S3\" coordinates=\"COORD\"/>";
-    auto numbered = [&](const std::string& prefix, int first) {
-        std::string out = elements;
-        for (int i = 1; i <= 3; ++i)
-            out = replaced(out, "S" + std::to_string(i), "s" + std::to_string(first + i - 1));
-        return replaced(
-            replaced(replaced(out, "\"l\"", "\"" + prefix + "l\""), "\"p\"", "\"" + prefix + "p\""), "\"e\"",
-            "\"" + prefix + "e\"");
-    };
-    const std::string text =
-        chartWith({{"flat", numbered("f", 1)}, {"deep", numbered("d", 4), false, /*z=*/true}});
-    Chart threeD = load(text);
-    apply(threeD, "<setStyle type=\"line\" subtype=\"3D\"><style color=\"red\"/></setStyle>");
-    Chart flat = load(text);
-    apply(flat, "<setStyle type=\"line\"><style color=\"red\"/></setStyle>");
-    for (int i = 1; i <= 6; ++i) {
-        const std::string id = "s" + std::to_string(i);
-        const bool inDeepGraph = i > 3;
-        EXPECT_EQ(attr(styleById(threeD, id.c_str()), "color") == "red", inDeepGraph) << id;
-        EXPECT_EQ(attr(styleById(flat, id.c_str()), "color") == "red", !inDeepGraph) << id;
-    }
-}
-
-TEST_F(ElementTypes, SchemaPartsTakeTheirOwnStylesAndMissingOnesAreMade) {
-    Chart chart = sample("boxplot.xml");
-    const auto before = styleSnapshot(chart);
-    apply(chart, "<setStyle type=\"schema\" subtype=\"hingeStyle\"><style color=\"red\"/></setStyle>");
-    EXPECT_EQ(changedStyles(before, styleSnapshot(chart)), (std::vector<std::string>{"hingeStyle"}));
-    EXPECT_EQ(attr(styleById(chart, "hingeStyle"), "color"), "red");
-
-    Chart own = sample("boxplot.xml");
-    apply(own, "<setStyle type=\"schema\" subtype=\"whatever\"><style color=\"red\"/></setStyle>");
-    EXPECT_EQ(attr(styleById(own, "boxStyle"), "color"), "red");
+TEST_F(ElementTypes, ElementsAndSchemaPartsWithoutAStyleGetANewOne) {
+    const Chart chart = expectStyles(chartWith({{"g1", "<interval id=\"b1\" coordinates=\"COORD\"/>"}}),
+                                     setStyle("bar", kRed), "style1:red", "c-o-n-t-a-i-n-er style1");
+    EXPECT_EQ(referred(chart, "b1", "style"), "style1 red");
 
     Chart bare = load(chartWith({{"g1", "<schema id=\"box\" style=\"s1\" coordinates=\"COORD\"/>"}}));
-    apply(bare, "<setStyle type=\"schema\" subtype=\"medianStyle\"><style color=\"red\"/></setStyle>");
+    apply(bare, setStyle("schema", kRed, sub("medianStyle")));
     auto* schema = dynamic_cast<GrxSchema*>(byId(bare, "box"));
     ASSERT_NE(schema, nullptr);
     GrxStyle* median = schema->getMedianStyle();
@@ -245,110 +209,6 @@ TEST_F(ElementTypes, SchemaPartsTakeTheirOwnStylesAndMissingOnesAreMade) {
     EXPECT_EQ(utf8(holder->getAttribute(u"id")), "c-o-n-t-a-i-n-er");
     EXPECT_EQ(attr(styleById(bare, "s1"), "color"), "black");
     EXPECT_EQ(schema->getHingeStyle(), nullptr);
-}
-
-TEST_F(ElementTypes, ScatterPointsWithBinsTakeOnlyTheDotSubtype) {
-    const std::string text =
-        chartWith({{"g1", "<point id=\"plain\" style=\"s1\" coordinates=\"COORD\"/>"
-                          "<point id=\"binned\" style=\"s2\" coordinates=\"COORD\"><binStatistic/></point>"
-                          "<line id=\"line\" style=\"s3\" coordinates=\"COORD\"/>"}});
-    Chart chart = load(text);
-    apply(chart, "<setStyle type=\"scatter\"><style color=\"red\"/></setStyle>");
-    EXPECT_EQ(attr(styleById(chart, "s1"), "color"), "red");
-    EXPECT_EQ(attr(styleById(chart, "s2"), "color"), "black");
-    EXPECT_EQ(attr(styleById(chart, "s3"), "color"), "black");
-    Chart dots = load(text);
-    apply(dots, "<setStyle type=\"scatter\" subtype=\"dot\"><style color=\"red\"/></setStyle>");
-    EXPECT_EQ(attr(styleById(dots, "s2"), "color"), "red");
-
-    Chart sampleChart = sample("scatter.xml");
-    apply(sampleChart, "<setStyle type=\"scatter\"><style color=\"red\"/></setStyle>");
-    EXPECT_EQ(attr(styleById(sampleChart, "pointStyle"), "color"), "red");
-}
-
-TEST_F(ElementTypes, AreasHistogramsAndRangesTakeTheirTypes) {
-    Chart area = sample("area.xml");
-    apply(area, "<setStyle type=\"area\"><style color=\"red\"/></setStyle>");
-    EXPECT_EQ(attr(styleById(area, "areaStyle"), "color"), "red");
-
-    // A histogram bar (bins and summaries) is no plain bar.
-    Chart asBar = sample("histogram.xml");
-    apply(asBar, "<setStyle type=\"bar\"><style color=\"red\"/></setStyle>");
-    EXPECT_NE(attr(styleById(asBar, "barStyle"), "color"), "red");
-    Chart histogram = sample("histogram.xml");
-    apply(histogram, "<setStyle type=\"histogram\"><style color=\"red\"/></setStyle>");
-    EXPECT_EQ(attr(styleById(histogram, "barStyle"), "color"), "red");
-    EXPECT_NE(attr(styleById(histogram, "normalLineStyle"), "color"), "red");
-
-    const std::string ranges = chartWith(
-        {{"g1",
-          "<interval id=\"r1\" style=\"sq\" coordinates=\"COORD\"><summaryStatistic method=\"7\"/></interval>"
-          "<interval id=\"r2\" style=\"s2\" coordinates=\"COORD\"><summaryStatistic "
-          "method=\"7\"/></interval>"}},
-        "<style id=\"sq\" symbol=\"square\" color=\"black\"/>");
-    Chart range = load(ranges);
-    apply(range, "<setStyle type=\"range\"><style color=\"red\"/></setStyle>");
-    EXPECT_EQ(attr(styleById(range, "sq"), "color"), "red");
-    EXPECT_EQ(attr(styleById(range, "s2"), "color"), "black");
-}
-
-TEST_F(ElementTypes, TheCoordinateAttributeChoosesTheCoordinates) {
-    Chart second = sample("dual-y-axis.xml");
-    apply(second, "<setStyle type=\"line\"><style coordinate=\"1\" color=\"red\"/></setStyle>");
-    EXPECT_EQ(attr(styleById(second, "lineStyle"), "color"), "red");
-    Chart first = sample("dual-y-axis.xml");
-    const auto before = styleSnapshot(first);
-    apply(first, "<setStyle type=\"line\"><style coordinate=\"0\" color=\"red\"/></setStyle>");
-    EXPECT_TRUE(changedStyles(before, styleSnapshot(first)).empty());
-    Chart bars = sample("dual-y-axis.xml");
-    apply(bars, "<setStyle type=\"bar\"><style coordinate=\"1\" color=\"red\"/></setStyle>");
-    EXPECT_NE(attr(styleById(bars, "barStyle"), "color"), "red");
-}
-
-TEST_F(ElementTypes, ElementsWithoutAStyleGetANewOne) {
-    Chart chart = load(chartWith({{"g1", "<interval id=\"b1\" coordinates=\"COORD\"/>"}}));
-    apply(chart, "<setStyle type=\"bar\"><style color=\"red\"/></setStyle>");
-    GrxStyle* made = styleOfElement(chart, "b1");
-    ASSERT_NE(made, nullptr);
-    EXPECT_EQ(attr(made, "color"), "red");
-    EXPECT_EQ(attr(made, "id"), "style1");
-}
-
-TEST_F(ElementTypes, PatternedBarsWithoutAColourAreWhitened) {
-    const std::string text = chartWith(
-        {{"g1",
-          "<interval id=\"b1\" style=\"bare\" coordinates=\"COORD\"><styleBy id=\"pattern_1\"/></interval>"
-          "<interval id=\"b2\" style=\"s2\" coordinates=\"COORD\"><styleBy id=\"pattern_2\"/></interval>"
-          "<interval id=\"b3\" style=\"bare2\" coordinates=\"COORD\"><styleBy id=\"dash_1\"/></interval>"}},
-        "<style id=\"bare\"/><style id=\"bare2\"/>");
-    Chart chart = load(text);
-    apply(chart, "<setStyle type=\"bar\"><style stroke-width=\"2pt\"/></setStyle>");
-    EXPECT_EQ(attr(styleById(chart, "bare"), "color"), "white");
-    EXPECT_EQ(attr(styleById(chart, "s2"), "color"), "black");
-    EXPECT_FALSE(styleById(chart, "bare2")->isColorPresent());
-    EXPECT_EQ(attr(styleById(chart, "bare2"), "stroke-width"), "2pt");
-}
-
-TEST_F(ElementTypes, UnknownTypesAndDeclarationsBeyondTheGraphsChangeNothing) {
-    for (const char* body : {"<setStyle type=\"interval\"><style color=\"red\"/></setStyle>",
-                             "<setStyle type=\"bar\"><style number=\"3\" color=\"red\"/></setStyle>",
-                             "<setStyle type=\"bar\"/>"}) {
-        Chart chart = sample("simple-bar.xml");
-        const std::string before = chart.vis->AsUTF8();
-        EXPECT_TRUE(apply(chart, body)) << body;
-        EXPECT_EQ(chart.vis->AsUTF8(), before) << body;
-    }
-}
-
-TEST_F(ElementTypes, ASimpleBarChangesOnlyItsBarStyle) {
-    Chart chart = sample("simple-bar.xml");
-    const auto before = styleSnapshot(chart);
-    apply(chart, "<setStyle type=\"bar\"><style color=\"#112233\" stroke-width=\"2pt\"/></setStyle>");
-    EXPECT_EQ(changedStyles(before, styleSnapshot(chart)), (std::vector<std::string>{"barStyle"}));
-    GrxStyle* style = styleById(chart, "barStyle");
-    EXPECT_EQ(attr(style, "color"), "#112233");
-    EXPECT_EQ(attr(style, "stroke-width"), "2pt");
-    EXPECT_EQ(attr(style, "width"), "60%;10%;90%");
 }
 
 } // namespace
