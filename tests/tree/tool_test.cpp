@@ -2,7 +2,7 @@
 #include "TreeSupport.h"
 #include "support/ToolRunner.h"
 
-#include <gtest/gtest.h>
+#include <fstream>
 
 namespace {
 
@@ -29,7 +29,7 @@ TEST(TreeTool, PrintsSettingsWithTheOptions) {
     EXPECT_EQ(attr(colours[1], "value"), "#FF020202");
 }
 
-TEST(TreeTool, WritesPlainAndCompressedModel) {
+TEST(TreeTool, WritesPlainAndCompressedModelAndReadsTheCompressedBack) {
     TempDir dir;
     const ToolResult r = runTool("tree --pmml " + pmmlPath("churn-surrogates.xml") + " --pmml-out '" +
                                  dir.file("out.xml") + "' --compressed-pmml-out '" + dir.file("out.z") + "'");
@@ -37,9 +37,7 @@ TEST(TreeTool, WritesPlainAndCompressedModel) {
     Reader reader;
     auto* model = reader.read(readAll(dir.file("out.xml")));
     ASSERT_NE(model, nullptr);
-    EXPECT_EQ(u8(model->getDocumentElement()->getLocalName()), "PMML");
     EXPECT_EQ(elements(model, "CompoundPredicate").size(), 4u);
-    // The compressed model is read back like one the host hands over.
     const ToolResult again =
         runTool("tree --pmml '" + dir.file("out.z") + "' --pmml-out '" + dir.file("again.xml") + "'");
     ASSERT_EQ(again.exitCode, 0) << again.output;
@@ -51,19 +49,22 @@ TEST(TreeTool, RefusesBadInput) {
     std::ofstream(dir.file("bad.xml"))
         << "<PMML version=\"2.1\" xmlns=\"http://www.dmg.org/PMML-2_1\"><x/></PMML>";
     std::ofstream(dir.file("settings.xml")) << "<displaySettings/>";
-    EXPECT_EQ(runTool("tree").exitCode, 2);
-    EXPECT_EQ(runTool("tree --pmml " + pmmlPath("credit-risk.xml") + " --zoom 501").exitCode, 2);
-    EXPECT_EQ(runTool("tree --pmml " + pmmlPath("credit-risk.xml") + " --orientation sideways").exitCode, 2);
-    EXPECT_EQ(runTool("tree --pmml " + pmmlPath("credit-risk.xml") + " --bogus x").exitCode, 2);
-    EXPECT_EQ(runTool("tree --pmml " + pmmlPath("credit-risk.xml") + " --pmml-out -").exitCode, 2);
+    const std::string credit = "tree --pmml " + pmmlPath("credit-risk.xml");
+    const std::pair<std::string, int> cases[] = {
+        {"tree", 2},
+        {credit + " --zoom 501", 2},
+        {credit + " --orientation sideways", 2},
+        {credit + " --bogus x", 2},
+        {credit + " --pmml-out -", 2},
+        {credit + " --settings '" + dir.file("settings.xml") + "'", 1},
+        {"tree --pmml '" + dir.file("missing.xml") + "'", 1},
+    };
+    for (const auto& [args, exitCode] : cases)
+        EXPECT_EQ(runTool(args).exitCode, exitCode) << args;
     const ToolResult model =
         runTool("tree --pmml '" + dir.file("bad.xml") + "' --pmml-out '" + dir.file("o.xml") + "'");
     EXPECT_EQ(model.exitCode, 1) << model.output;
     EXPECT_NE(model.output.find("not a valid PMML 2.1 tree"), std::string::npos) << model.output;
-    const ToolResult settings = runTool("tree --pmml " + pmmlPath("credit-risk.xml") + " --settings '" +
-                                        dir.file("settings.xml") + "'");
-    EXPECT_EQ(settings.exitCode, 1) << settings.output;
-    EXPECT_EQ(runTool("tree --pmml '" + dir.file("missing.xml") + "'").exitCode, 1);
 }
 
 } // namespace
