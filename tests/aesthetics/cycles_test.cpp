@@ -74,17 +74,6 @@ TEST_F(SetDashAndShape, TheSourceGuardsEachAestheticItGivesACycle) {
     EXPECT_EQ(chart.AsUTF8(), before);
 }
 
-TEST_F(SetDashAndShape, AppliedTwiceTheyReplaceRatherThanAppend) {
-    GrxVisualization& once = parse(kSeries);
-    GrxVisualization& twice = parse(kSeries);
-    for (GrxVisualization* chart : {&once, &twice, &twice}) {
-        applyAction<TSetDash>(kSetDash, *chart);
-        applyAction<TSetShape>(kSetShape, *chart);
-    }
-    EXPECT_EQ(canonical(twice), canonical(once));
-    EXPECT_EQ(orphanedStyleCycles(twice), orphanedStyleCycles(once) + 3);
-}
-
 // ---- setPattern ---------------------------------------------------------------------------------
 
 const std::string kPatterns =
