@@ -137,7 +137,7 @@ TEST_F(SetGenericAttributes, TheInstructionsIdAndQualifiedAttributesStayInTheTem
     EXPECT_EQ(grammar_test::chartFaults(chart()), "");
 }
 
-TEST_F(SetGenericAttributes, StylesMadeOnTheWayAreNotMatchedAgainNorTwice) {
+TEST_F(SetGenericAttributes, StylesMadeOnTheWayAreNotMatchedAgainAndARepeatWritesTheSame) {
     const auto* styles =
         static_cast<const GrxBaseElement&>(chart()).getImplementation()->getElementsByTagName(u"style");
     const XMLSize_t before = styles->getLength();
