@@ -6,7 +6,6 @@
 
 using namespace XERCES_CPP_NAMESPACE;
 using engine_test::Chart;
-using engine_test::EngineTest;
 
 namespace {
 
@@ -17,75 +16,63 @@ public:
     bool apply() override { return false; }
 };
 
-std::string utf8(const XMLCh* s) {
-    return ChartString(s).toUTF8();
-}
-
-class BaseTemplateTest : public EngineTest {
+class BaseTemplateTest : public engine_test::EngineTest {
 protected:
-    void SetUp() override { chart_ = Chart::empty(); }
-    // An instruction element with the given attributes, in a document of its own.
+    void SetUp() override {
+        chart_ = Chart::empty();
+        instructions_ = Chart::empty();
+    }
+    // An instruction element with the given attributes.
     const DOMElement* instruction(std::initializer_list<std::pair<const XMLCh*, const XMLCh*>> attributes) {
-        if (!instructions_.vis)
-            instructions_ = Chart::empty();
-        DOMDocument* d = instructions_.document();
-        DOMElement* e = d->createElement(u"setStyle");
-        d->getDocumentElement()->appendChild(e);
+        DOMElement* e = instructions_.document()->createElement(u"setStyle");
+        instructions_.document()->getDocumentElement()->appendChild(e);
         for (const auto& [name, value] : attributes)
             e->setAttribute(name, value);
         return e;
     }
     GrrUviza& graph() { return chart_.vis->addGraph(); }
-    Chart chart_;
-    Chart instructions_;
+    Chart chart_, instructions_;
 };
 
-TEST_F(BaseTemplateTest, StylesGoIntoOneContainerUnderFreshIds) {
-    Probe probe(nullptr, *chart_.vis, nullptr);
-    GrxStyle& first = probe.addStyle(*chart_.vis, u"");
-    GrxStyle& second = probe.addStyle(*chart_.vis, nullptr);
-    EXPECT_EQ(utf8(first.getId()), "style1");
-    EXPECT_EQ(utf8(second.getId()), "style2");
-    GrxStyle* container = chart_.vis->getStyleById(u"c-o-n-t-a-i-n-er");
-    ASSERT_NE(container, nullptr);
-    EXPECT_EQ(container->getStyles().size(), 2u);
-    EXPECT_EQ(first.getImplementation()->getParentNode(), container->getImplementation());
-    EXPECT_EQ(chart_.vis->getStyles().size(), 1u); // only the container at the top
-}
-
-TEST_F(BaseTemplateTest, AnExistingStyleIsReturnedAndNothingAdded) {
+TEST_F(BaseTemplateTest, StylesGoIntoOneContainerUnderFreshIdsAndExistingOnesAreReused) {
     GrxStyle& own = chart_.vis->addStyle();
     own.setId(u"titleStyle");
-    Probe probe(nullptr, *chart_.vis, nullptr);
-    EXPECT_EQ(&probe.addStyle(*chart_.vis, u"titleStyle"), &own);
-    EXPECT_EQ(chart_.vis->getStyleById(u"c-o-n-t-a-i-n-er"), nullptr);
-}
-
-TEST_F(BaseTemplateTest, AnIdHeldByAnotherKindOfElementIsNotTakenFromIt) {
     GrrUviza& g = graph();
     g.setId(u"main");
     Probe probe(nullptr, *chart_.vis, nullptr);
-    GrxStyle& style = probe.addStyle(*chart_.vis, u"main");
+    EXPECT_EQ(&probe.addStyle(*chart_.vis, u"titleStyle"), &own);
+    EXPECT_EQ(chart_.vis->getStyleById(u"c-o-n-t-a-i-n-er"), nullptr)
+        << "nothing added for an existing style";
+    GrxStyle& first = probe.addStyle(*chart_.vis, u"");
+    GrxStyle& second = probe.addStyle(*chart_.vis, nullptr);
+    GrxStyle& third = probe.addStyle(*chart_.vis, u"main"); // held by a graph, which keeps it
+    EXPECT_EQ(ChartString(first.getId()).toUTF8() + " " + ChartString(second.getId()).toUTF8() + " " +
+                  ChartString(third.getId()).toUTF8(),
+              "style1 style2 main1");
     EXPECT_EQ(chart_.vis->getElementById(u"main"), g.getImplementation());
-    EXPECT_EQ(utf8(style.getId()), "main1");
+    GrxStyle* container = chart_.vis->getStyleById(u"c-o-n-t-a-i-n-er");
+    ASSERT_NE(container, nullptr);
+    EXPECT_EQ(container->getStyles().size(), 3u);
+    EXPECT_EQ(first.getImplementation()->getParentNode(), container->getImplementation());
+    EXPECT_EQ(chart_.vis->getStyles().size(), 2u); // the own style and the container
 }
 
 TEST_F(BaseTemplateTest, GraphsAreSelectedByNumberAndAllCounted) {
     GrrUviza& a = graph();
     GrrUviza& b = graph();
-    GrxContainer& box = chart_.vis->addContainer();
-    GrrUviza& c = box.addGraph(); // deeper graphs count too
-    std::vector<GrrUviza*> picked;
-    EXPECT_EQ(Probe(nullptr, *chart_.vis, instruction({{u"graph", u"2"}})).getGraphs(picked), 3u);
-    EXPECT_EQ(picked, (std::vector<GrrUviza*>{&b}));
-    picked.clear();
-    EXPECT_EQ(Probe(nullptr, *chart_.vis, instruction({})).getGraphs(picked), 3u);
-    EXPECT_EQ(picked, (std::vector<GrrUviza*>{&a, &b, &c}));
-    picked.clear();
-    EXPECT_EQ(Probe(nullptr, *chart_.vis, instruction({{u"graph", u"7"}})).getGraphs(picked), 3u);
-    EXPECT_TRUE(picked.empty());
-    EXPECT_EQ(Probe(nullptr, *chart_.vis).getGraphs(picked), 3u); // no instruction: all
-    EXPECT_EQ(picked.size(), 3u);
+    GrrUviza& c = chart_.vis->addContainer().addGraph(); // deeper graphs count too
+    const struct {
+        const DOMElement* instruction;
+        std::vector<GrrUviza*> picked;
+    } cases[] = {{instruction({{u"graph", u"2"}}), {&b}},
+                 {instruction({}), {&a, &b, &c}},
+                 {instruction({{u"graph", u"7"}}), {}},
+                 {nullptr, {&a, &b, &c}}};
+    for (const auto& row : cases) {
+        std::vector<GrrUviza*> picked;
+        EXPECT_EQ(Probe(nullptr, *chart_.vis, row.instruction).getGraphs(picked), 3u);
+        EXPECT_EQ(picked, row.picked);
+    }
 }
 
 TEST_F(BaseTemplateTest, DimensionRolesCountReferencesButReturnOnlyDimensions) {
@@ -94,20 +81,16 @@ TEST_F(BaseTemplateTest, DimensionRolesCountReferencesButReturnOnlyDimensions) {
     GrxDimension& x = first.addDimension();
     GrxDimension& y = first.addDimension();
     Probe probe(nullptr, *chart_.vis, nullptr);
-    EXPECT_EQ(probe.getDimensionsByRole(g, ChartString("x")), (std::vector<GrxDimension*>{&x}));
-    EXPECT_EQ(probe.getDimensionsByRole(g, ChartString("y")), (std::vector<GrxDimension*>{&y}));
     EXPECT_TRUE(probe.getDimensionsByRole(g, ChartString("y2")).empty());
-    EXPECT_TRUE(probe.getDimensionsByRole(g, ChartString("z")).empty());
-    EXPECT_TRUE(probe.getDimensionsByRole(g, ChartString("w")).empty());
-
     GrxCoordinates& second = g.addCoordinates();
     second.addDimensionReference().setDimension(x); // takes the first place
     GrxDimension& y2 = second.addDimension();
     GrxDimension& z = second.addDimension();
-    EXPECT_EQ(probe.getDimensionsByRole(g, ChartString("x")), (std::vector<GrxDimension*>{&x}));
-    EXPECT_EQ(probe.getDimensionsByRole(g, ChartString("y")), (std::vector<GrxDimension*>{&y}));
-    EXPECT_EQ(probe.getDimensionsByRole(g, ChartString("y2")), (std::vector<GrxDimension*>{&y2}));
-    EXPECT_EQ(probe.getDimensionsByRole(g, ChartString("z")), (std::vector<GrxDimension*>{&z}));
+    const std::pair<const char*, GrxDimension*> roles[] = {{"x", &x}, {"y", &y}, {"y2", &y2}, {"z", &z}};
+    for (const auto& [role, dimension] : roles)
+        EXPECT_EQ(probe.getDimensionsByRole(g, ChartString(role)), std::vector<GrxDimension*>{dimension})
+            << role;
+    EXPECT_TRUE(probe.getDimensionsByRole(g, ChartString("w")).empty());
 }
 
 TEST_F(BaseTemplateTest, QuestionsAboutAGraph) {
@@ -120,15 +103,12 @@ TEST_F(BaseTemplateTest, QuestionsAboutAGraph) {
     EXPECT_FALSE(probe.isGraphClustered(g));
     coordinates.addPolarTransform();
     EXPECT_TRUE(probe.isGraphPolar(g));
-    GrxSourceVariable& cluster = chart_.vis->addSourceVariable();
-    x.setClusterVariable(cluster);
+    x.setClusterVariable(chart_.vis->addSourceVariable());
     EXPECT_TRUE(probe.isGraphClustered(g));
 
-    EXPECT_FALSE(probe.isChartTrue3D(g));
     probe.addZDimension(g);
-    ASSERT_EQ(coordinates.getDimensions().size(), 3u);
     probe.addZDimension(g); // three already: nothing more
-    EXPECT_EQ(coordinates.getDimensions().size(), 3u);
+    ASSERT_EQ(coordinates.getDimensions().size(), 3u);
     coordinates.getDimensions()[2]->addAxis();
     GrxPoint& point = g.addPoint();
     EXPECT_FALSE(probe.isChartTrue3D(g));
@@ -144,8 +124,11 @@ TEST_F(BaseTemplateTest, ElementsKindByKindAndRangesAndAxes) {
     std::vector<CTElementType*> all;
     BaseTemplate::getAllElements(g, all);
     EXPECT_EQ(all, (std::vector<CTElementType*>{&point, &line, &bar}));
-
+    std::vector<CTElementType*> lines;
     Probe probe(nullptr, *chart_.vis, nullptr);
+    probe.getAllElementsByType(u"line", lines);
+    EXPECT_EQ(lines, (std::vector<CTElementType*>{&line}));
+
     EXPECT_FALSE(probe.isIntervalRangeElement(bar));
     bar.addSummaryStatistic().setMethod(7);
     EXPECT_TRUE(probe.isIntervalRangeElement(bar));
@@ -159,10 +142,6 @@ TEST_F(BaseTemplateTest, ElementsKindByKindAndRangesAndAxes) {
     EXPECT_FALSE(probe.isAxisDerived(axis));
     axis.setTransform(0);
     EXPECT_TRUE(probe.isAxisDerived(axis));
-
-    std::vector<CTElementType*> lines;
-    probe.getAllElementsByType(u"line", lines);
-    EXPECT_EQ(lines, (std::vector<CTElementType*>{&line}));
 }
 
 TEST_F(BaseTemplateTest, ScatterplotMatrixElementNeedsSlashesInBothExpressions) {
@@ -196,20 +175,21 @@ TEST_F(BaseTemplateTest, CoordinatesMatchByPosition) {
     GrxCoordinates& first = g.addCoordinates();
     GrxCoordinates& second = g.addCoordinates();
     GrxPoint& own = g.addPoint();
-    GrxLine& none = g.addLine();
+    const CTElementType& none = g.addLine();
     own.setCoordinates(second);
+    const CTElementType& ownElement = own;
     Probe probe(nullptr, *chart_.vis, nullptr);
-    EXPECT_TRUE(probe.doesCoordinateMatch(static_cast<const CTElementType&>(own), ChartString("1")));
-    EXPECT_FALSE(probe.doesCoordinateMatch(static_cast<const CTElementType&>(own), ChartString("0")));
-    EXPECT_FALSE(probe.doesCoordinateMatch(static_cast<const CTElementType&>(own), ChartString("5")));
-    EXPECT_TRUE(probe.doesCoordinateMatch(static_cast<const CTElementType&>(none), ChartString("")));
-    EXPECT_FALSE(probe.doesCoordinateMatch(static_cast<const CTElementType&>(none), ChartString("1")));
+    EXPECT_TRUE(probe.doesCoordinateMatch(ownElement, ChartString("1")));
+    EXPECT_FALSE(probe.doesCoordinateMatch(ownElement, ChartString("0")));
+    EXPECT_FALSE(probe.doesCoordinateMatch(ownElement, ChartString("5")));
+    EXPECT_TRUE(probe.doesCoordinateMatch(none, ChartString("")));
+    EXPECT_FALSE(probe.doesCoordinateMatch(none, ChartString("1")));
 
-    GrxDimension& inSecond = second.addDimension();
-    GrxDimension& inFirst = first.addDimension();
-    EXPECT_TRUE(probe.doesCoordinateMatch(static_cast<const GrxBaseElement&>(inSecond), ChartString("y2")));
-    EXPECT_FALSE(probe.doesCoordinateMatch(static_cast<const GrxBaseElement&>(inSecond), ChartString("y")));
-    EXPECT_TRUE(probe.doesCoordinateMatch(static_cast<const GrxBaseElement&>(inFirst), ChartString("y")));
+    const GrxBaseElement& inSecond = second.addDimension();
+    const GrxBaseElement& inFirst = first.addDimension();
+    EXPECT_TRUE(probe.doesCoordinateMatch(inSecond, ChartString("y2")));
+    EXPECT_FALSE(probe.doesCoordinateMatch(inSecond, ChartString("y")));
+    EXPECT_TRUE(probe.doesCoordinateMatch(inFirst, ChartString("y")));
     EXPECT_FALSE(probe.doesCoordinateMatch(static_cast<const GrxBaseElement&>(g), ChartString("y")));
 }
 
@@ -235,12 +215,6 @@ TEST_F(BaseTemplateTest, VariablesOfAnElementAndTheirCopies) {
     EXPECT_EQ(to.getX()->getVariable(), &vx);
     EXPECT_EQ(to.getY()->getVariable(), &vy);
     EXPECT_EQ(to.getZ(), nullptr);
-}
-
-TEST_F(BaseTemplateTest, VocabularyTextsThatDifferFromTheirNames) {
-    EXPECT_EQ(utf8(BaseTemplate::_scalar), "scalarDot");
-    EXPECT_EQ(utf8(BaseTemplate::_when), "facet1==facet2");
-    EXPECT_EQ(utf8(BaseTemplate::_legend_1), "_legend_1");
 }
 
 } // namespace
