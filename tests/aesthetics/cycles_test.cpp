@@ -42,6 +42,12 @@ TEST_F(SetDashAndShape, EachSelectedAestheticGetsACycleOfItsOwn) {
     // Shapes and sizes are not dashes.
     EXPECT_EQ(cycleIdOf(chart, "shape_1"), "chartCycle");
     EXPECT_EQ(cycleIdOf(chart, "pointSize"), "chartCycle");
+    // Nor are colours and style-bys.
+    GrxVisualization& lines = sample("line-series.xml");
+    EXPECT_TRUE(applyAction<TSetDash>(kSetDash, lines));
+    EXPECT_EQ(stylesOf(lines, "dash_1"), kDashStyles);
+    EXPECT_EQ(cycleIdOf(lines, "color_1"), "styleCycleColor");
+    EXPECT_EQ(cycleIdOf(lines, "styleBy_dash"), "styleCycleDash");
 
     EXPECT_TRUE(applyAction<TSetShape>(kSetShape, chart));
     EXPECT_EQ(stylesOf(chart, "shape_1"), "[({symbol=triangle;})]");
