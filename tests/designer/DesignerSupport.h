@@ -1,11 +1,13 @@
 #ifndef PLOTAID_TESTS_DESIGNER_DESIGNERSUPPORT_H
 #define PLOTAID_TESTS_DESIGNER_DESIGNERSUPPORT_H
 
-// What the checks of the example templates share: the sample charts and templates, a second
-// validator (xmllint), a template applied in-process, and the chart's DOM read by id and name.
+// What the checks of the example templates share: the sample charts and templates, a template
+// applied in-process, and the chart's DOM read by id and name.
 
 #include "support/EngineSupport.h"
 #include "support/TestSupport.h"
+
+#include "foundation/ValidatingParser.h"
 
 #include <plotaid/ChartTemplate.h>
 
@@ -14,15 +16,11 @@
 #include <xercesc/dom/DOM.hpp>
 
 #include <algorithm>
-#include <cstdio>
-#include <cstdlib>
 #include <filesystem>
 #include <map>
 #include <set>
 #include <string>
 #include <vector>
-
-#include <sys/wait.h>
 
 namespace designer_test {
 
@@ -50,50 +48,16 @@ inline std::string examplePath(const std::string& relative) {
     return std::string(PLOTAID_EXAMPLES_DIR) + "/" + relative;
 }
 
-inline std::string shellQuoted(const std::string& s) {
-    std::string out = "'";
-    for (char c : s)
-        out += c == '\'' ? std::string("'\\''") : std::string(1, c);
-    return out + "'";
-}
-
-inline bool haveXmllint() {
-    return std::system("xmllint --version >/dev/null 2>&1") == 0;
-}
-
-struct LintResult {
-    int exitCode = -1;
-    std::string output;
-};
-
-// Validates `file` against a grammar of resources/schemas with xmllint, independent of Xerces-C.
-// The grammars' URIs map to the source tree through a catalog written into `scratch`, and the
-// network stays off, so nothing is fetched.
-inline LintResult xmllint(const TempDir& scratch, const std::string& schema, const std::string& file) {
-    const std::string schemas = std::string(PLOTAID_SOURCE_DIR) + "/resources/schemas/";
-    const std::string catalog = scratch.file("catalog.xml");
-    if (!std::filesystem::exists(catalog)) {
-        std::ofstream out(catalog, std::ios::binary);
-        out << "<?xml version=\"1.0\"?>\n<catalog xmlns=\"urn:oasis:names:tc:entity:xmlns:xml:catalog\">\n"
-            << "  <rewriteSystem systemIdStartString=\"http://plotaid.org/grxml/\" rewritePrefix=\"file://"
-            << schemas << "\"/>\n"
-            << "  <rewriteURI uriStartString=\"http://plotaid.org/grxml/\" rewritePrefix=\"file://" << schemas
-            << "\"/>\n</catalog>\n";
-    }
-    const std::string command = "XML_CATALOG_FILES=" + shellQuoted(catalog) +
-                                " xmllint --nonet --noout --schema " + shellQuoted(schemas + schema) + " " +
-                                shellQuoted(file) + " 2>&1";
-    LintResult result;
-    FILE* pipe = ::popen(command.c_str(), "r");
-    if (pipe == nullptr)
-        return result;
-    char buffer[4096];
-    std::size_t n;
-    while ((n = std::fread(buffer, 1, sizeof buffer, pipe)) > 0)
-        result.output.append(buffer, n);
-    const int status = ::pclose(pipe);
-    result.exitCode = WIFEXITED(status) ? WEXITSTATUS(status) : -1;
-    return result;
+// The tags of an example template's instructions, in order; empty when it does not parse.
+inline std::vector<std::string> instructionsOf(const std::string& name) {
+    plotaid::detail::ValidatingParser parser;
+    const auto* doc = parser.parse(engine_test::example("templates/" + name), name.c_str(),
+                                   ChartException("example template", "designer_test", 0));
+    std::vector<std::string> tags;
+    for (const auto* i = doc ? doc->getDocumentElement()->getFirstElementChild() : nullptr; i != nullptr;
+         i = i->getNextElementSibling())
+        tags.push_back(ChartString(i->getLocalName()).toUTF8());
+    return tags;
 }
 
 // A sample chart with the named example templates applied in order, in-process and without a

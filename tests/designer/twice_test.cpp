@@ -81,32 +81,4 @@ TEST_F(StylePicture, SeesValuesNotIds) {
     EXPECT_EQ(differences(replaced, stylePicture(c)), "");
 }
 
-// "setShowLineMarkers" adds, rather than replaces: the first application puts a marker element
-// and a legend entry into the chart of one line; the second finds a graph of two elements and
-// adds nothing.
-TEST_F(AppliedTwice, LineMarkersAreAddedOnceAndNotAgain) {
-    const auto count = [](const Chart& c, const std::string& name) {
-        return elementsNamed(c.document(), name).size();
-    };
-    const Chart original = Chart::parse(engine_test::example("charts/line-series.xml"));
-    const Chart once = applied("line-series.xml", {"monochrome.sgt"});
-    const Chart twice = applied("line-series.xml", {"monochrome.sgt", "monochrome.sgt"});
-    ASSERT_TRUE(original.vis && once.vis && twice.vis);
-    EXPECT_EQ(count(original, "point"), 0u);
-    EXPECT_EQ(count(once, "point"), 1u);
-    EXPECT_EQ(count(twice, "point"), 1u);
-    EXPECT_EQ(count(once, "legendTarget"), count(original, "legendTarget") + 1);
-    EXPECT_EQ(count(twice, "legendTarget"), count(once, "legendTarget"));
-    // The marker's own style is one more style of the chart, and stays the only one added for it.
-    const std::vector<DOMElement*> markers = elementsNamed(once.document(), "point");
-    ASSERT_EQ(markers.size(), 1u);
-    const std::string markerStyle = "style " + attr(markers.front(), "style");
-    EXPECT_EQ(stylePicture(original).count(markerStyle), 0u);
-    EXPECT_EQ(stylePicture(once).count(markerStyle), 1u);
-    EXPECT_EQ(stylePicture(twice).count(markerStyle), 1u);
-    EXPECT_EQ(elementsNamed(twice.document(), "style").size(),
-              elementsNamed(once.document(), "style").size() + 4)
-        << "only the orphaned cycles of the second application's replacements are new";
-}
-
 } // namespace
