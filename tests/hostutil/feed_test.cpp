@@ -1,38 +1,10 @@
 #include <feed/corekit.h>
 #include <feed/memory.h>
-#include <kovar/kovarconv.h>
 
 #include <gtest/gtest.h>
 
 #include <cstring>
 #include <memory>
-
-TEST(FeedMemory, CasesSourcesAndLabels) {
-    feed::MemoryCase cases;
-    cases.setText(3, "abcdefghij"); // whole blank-padded cells of 8
-    ASSERT_EQ(cases.GetObsCount(3), 2u);
-    EXPECT_EQ(std::string(cases.GetObsPointer(3)[1].text, 8), "ij      ");
-    cases.setNumber(3, 2.5);
-    EXPECT_EQ(cases.GetObsCount(3), 1u);
-    EXPECT_EQ(cases.GetObsPointer(3)->number, 2.5);
-    cases.clear(3);
-    EXPECT_EQ(cases.GetObsPointer(3), nullptr);
-
-    feed::MemoryDataSource source;
-    source.setSplitVariables({source.addVariable("v", "", Kovar_Format(5, 8, 2))});
-    EXPECT_EQ(source.GetVariable(1), nullptr);
-    EXPECT_EQ(source.GetVariable(-1), nullptr);
-    EXPECT_EQ(source.GetSplitVariableIndex(1), -1);
-    EXPECT_EQ(source.GetVariable(0)->IsMissing(kovar::kMissingValue), 1);
-    EXPECT_EQ(source.GetVariable(0)->IsMissing(0.0), 0);
-
-    feed::MemoryValueLabels labels; // text labels ignore trailing blanks only
-    labels.add("ab  ", "first");
-    std::string label;
-    EXPECT_TRUE(labels.GetLabel(std::string("ab      "), label));
-    EXPECT_EQ(label, "first");
-    EXPECT_FALSE(labels.GetLabel(std::string(" ab"), label));
-}
 
 TEST(FeedHeadings, ShowModesPreferencesAndSublists) {
     feed::MemoryVariable labelled("sex", "Sex of respondent", Kovar_Format(5, 4, 0));
