@@ -1,6 +1,8 @@
 // What each designer template visibly does to a chart it fits.
 #include "DesignerSupport.h"
 
+#include "support/GrammarSupport.h"
+
 using namespace designer_test;
 using engine_test::Chart;
 using engine_test::EngineTest;
@@ -89,28 +91,6 @@ TEST_F(CorporateLook, GroupedElementsCycleThroughTheBrandPaletteAndDashes) {
     const Chart lines = applied("line-series.xml", {"corporate.sgt"});
     EXPECT_EQ(attrs(cycleStyles(lines, byId(lines, "dash_1")), "stroke-dasharray"),
               (std::vector<std::string>{"none", "6 3", "2 2", "8 3 2 3"}));
-}
-
-// No sample chart varies a pattern; a variant of the bar chart does. Patterns are drawn on white:
-// with no source visualization that says otherwise, the bars' own colour gives way.
-TEST_F(CorporateLook, PatternedBarsCycleThroughHatchesOnWhite) {
-    std::string text = engine_test::example("charts/simple-bar.xml");
-    const std::string at = "<color id=\"color_1\"";
-    const std::string::size_type where = text.find(at);
-    ASSERT_NE(where, std::string::npos);
-    text.insert(where, "<pattern id=\"pattern_1\" variable=\"var_jobcat\" cycle=\"styleCycleRepository\" "
-                       "domain=\"domain_jobcat\"/>");
-    Chart c = Chart::parse(text);
-    ASSERT_TRUE(c.vis);
-    ChartTemplate t(*c.vis, nullptr);
-    ASSERT_TRUE(t.setTemplate(engine_test::example("templates/corporate.sgt")));
-    t.applyTemplate();
-    const DOMElement* pattern = byId(c, "pattern_1");
-    ASSERT_NE(pattern, nullptr);
-    EXPECT_EQ(attrs(cycleStyles(c, pattern), "pattern"), (std::vector<std::string>{"0", "3", "5", "7"}));
-    EXPECT_EQ(attrOf(c, "barStyle", "color"), "white");
-    // The outline keeps the brand colour the bar declaration gave it.
-    EXPECT_EQ(attrOf(c, "barStyle", "color2"), "#0B2540");
 }
 
 using MonochromeLook = EngineTest;
@@ -203,23 +183,37 @@ TEST_F(PresentationLook, LargeTextsThickStrokesLongTicksAndBigMarkers) {
               (std::vector<std::string>{"2pt"}));
 }
 
-// No sample chart sizes its points by a variable; a bubble variant of the scatter does.
-TEST_F(PresentationLook, PointSizesStepUpWhereSizeTellsGroupsApart) {
-    std::string text = engine_test::example("charts/scatter.xml");
-    const std::string at = "<shape id=\"shape_1\"";
-    const std::string::size_type where = text.find(at);
-    ASSERT_NE(where, std::string::npos);
-    text.insert(where, "<size id=\"size_1\" variable=\"var_gender\" cycle=\"styleCycleRepository\" "
-                       "domain=\"domain_gender\"/>");
-    Chart c = Chart::parse(text);
-    ASSERT_TRUE(c.vis);
-    ChartTemplate t(*c.vis, nullptr);
-    ASSERT_TRUE(t.setTemplate(engine_test::example("templates/presentation.sgt")));
-    t.applyTemplate();
-    const DOMElement* size = byId(c, "size_1");
-    ASSERT_NE(size, nullptr);
-    EXPECT_NE(attr(size, "cycle"), "styleCycleRepository");
-    EXPECT_EQ(attrs(cycleStyles(c, size), "size"), (std::vector<std::string>{"8pt", "14pt", "20pt", "26pt"}));
+// No sample chart varies a pattern or a size by a variable; variants of the bar chart and the
+// scatter do.
+TEST_F(CorporateLook, PatternedBarsTakeHatchesOnWhiteAndSizesStepUpInThePresentationLook) {
+    const auto variant = [](const std::string& chart, const std::string& before, const std::string& aesthetic,
+                            const std::string& look) {
+        Chart c =
+            Chart::parse(grammar_test::replaceOnce(engine_test::example("charts/" + chart), before,
+                                                   aesthetic + " cycle=\"styleCycleRepository\"/>" + before));
+        if (!c.vis)
+            return c;
+        ChartTemplate t(*c.vis, nullptr);
+        EXPECT_TRUE(t.setTemplate(engine_test::example("templates/" + look)));
+        t.applyTemplate();
+        return c;
+    };
+    const Chart bars = variant("simple-bar.xml", "<color id=\"color_1\"",
+                               "<pattern id=\"pattern_1\" variable=\"var_jobcat\" domain=\"domain_jobcat\"",
+                               "corporate.sgt");
+    ASSERT_TRUE(bars.vis);
+    EXPECT_EQ(attrs(cycleStyles(bars, byId(bars, "pattern_1")), "pattern"),
+              (std::vector<std::string>{"0", "3", "5", "7"}));
+    // Patterns are drawn on white: with no source that says otherwise, the bars' own colour gives
+    // way; the outline keeps the brand colour the bar declaration gave it.
+    EXPECT_EQ(attrOf(bars, "barStyle", "color") + " " + attrOf(bars, "barStyle", "color2"), "white #0B2540");
+
+    const Chart bubbles =
+        variant("scatter.xml", "<shape id=\"shape_1\"",
+                "<size id=\"size_1\" variable=\"var_gender\" domain=\"domain_gender\"", "presentation.sgt");
+    EXPECT_NE(attrOf(bubbles, "size_1", "cycle"), "styleCycleRepository");
+    EXPECT_EQ(attrs(cycleStyles(bubbles, byId(bubbles, "size_1")), "size"),
+              (std::vector<std::string>{"8pt", "14pt", "20pt", "26pt"}));
 }
 
 } // namespace
