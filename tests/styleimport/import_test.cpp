@@ -55,6 +55,7 @@ const char* const kScatter = "scatter.xml";
 const char* const kNavyRedBlue = R"(<style value="color:navy;stroke:red;fill:blue"/>)";
 const char* const kYellow = R"(<style gradient-color="yellow"/>)";
 const char* const kPlain = "";
+const char* const kGrayShadow = R"(<style><shadow color="gray" dx="2px"/></style>)";
 
 // clang-format off
 const Row kRows[] = {
@@ -71,8 +72,10 @@ const Row kRows[] = {
      "labelLocationHorizontal=left|labelLocationVertical=top|labelInside=1|text-fit=shrink|"
      "font-style=italic|stroke-linecap=butt|glyph-angle=45|shadow-color=gray|shadow-dx=1px|"
      "shadow-dy=2px|size=5pt"},
-    {kLine, "gridStyle", R"(<style value="stroke-dasharray:none" stroke-dasharray="4 2"/>)", "stroke-dasharray=4 2"},
-    {kLine, "axisStyle", R"(<style value="stroke-dasharray:6 1" stroke-dasharray="4 2"/>)", "stroke-dasharray=6 1"},
+    {kLine, "gridStyle", R"(<style value="stroke-dasharray:none" stroke-dasharray="4 2"/>)",
+     "stroke-dasharray=4 2"},
+    {kLine, "axisStyle", R"(<style value="stroke-dasharray:6 1" stroke-dasharray="4 2"/>)",
+     "stroke-dasharray=6 1"},
     // Lines take the stroke as their colour, over a CSS colour too, and never a fill.
     {kLine, "lineStyle", R"(<style value="stroke:red;fill:blue"/>)", "color=red|color2=#3E58AC|fill=-"},
     {kLine, "tickLabelStyle", R"(<style value="color:navy;stroke:olive"/>)", "color=olive"},
@@ -101,7 +104,8 @@ const Row kRows[] = {
     {kLine, "titleStyle", R"(<style value="font-size:16pt"/>)", "font-size=16pt;10pt;14pt"},
     {kLine, "axisLabelStyle", R"(<style font-size="11pt;8pt;13pt"/>)", "font-size=11pt;8pt;13pt"},
     {kLine, "tickLabelStyle", R"(<style value="min-font-size:6pt"/>)", "font-size=8pt;6pt"},
-    {kLine, "legendTextStyle", R"(<style value="font-size:10pt" font-size="1pt;5pt"/>)", "font-size=10pt;5pt"},
+    {kLine, "legendTextStyle", R"(<style value="font-size:10pt" font-size="1pt;5pt"/>)",
+     "font-size=10pt;5pt"},
     // Widths go into their parts.
     {kBar, "barStyle", R"(<style value="max-width:95%"/>)", "width=60%;10%;95%"},
     {kBar, "barStyle", R"(<style value="width:70%"/>)", "width=70%;10%;90%"},
@@ -116,7 +120,8 @@ const Row kRows[] = {
     {kScatter, "legendStyle", R"(<style value="glyph-sides:5"/>)", "glyph-sides=5"},
     {kScatter, "legendStyle", R"(<style><glyph angle="30" aspect="0.5" size="6pt" type="diamond"/></style>)",
      "glyph-angle=30|glyph-aspect=0.5|size=6pt|symbol=diamond"},
-    {kScatter, "legendStyle", R"(<style><glyph sides="4"/></style>)", "glyph-sides=4|glyph-angle=-|symbol=-|size=-"},
+    {kScatter, "legendStyle", R"(<style><glyph sides="4"/></style>)",
+     "glyph-sides=4|glyph-angle=-|symbol=-|size=-"},
     // Aspect, pattern and shadow opacity must read as what they are.
     {kScatter, "legendStyle", R"(<style><glyph aspect="-1"/></style>)", "glyph-aspect=-"},
     {kBar, "barStyle", R"(<style value="fill-pattern:-2;glyph-aspect:-1"/>)", "pattern=-|glyph-aspect=-"},
@@ -139,26 +144,31 @@ const Row kRows[] = {
     {kBar, "barStyle", R"(<style/>)", "gradient-color=yellow", kYellow, kYellow},
 
     // Under the source guard, what the chart's own definition sets stays.
-    {kLine, "visualizationStyle", R"(<style value="color:red;fill:blue;stroke:green;font-size:20pt" padding="9pt"/>)",
+    {kLine, "visualizationStyle",
+     R"(<style value="color:red;fill:blue;stroke:green;font-size:20pt" padding="9pt"/>)",
      "color=white|color2=green|font-size=9pt|padding=3pt", kPlain},
-    {kLine, "visualizationStyle", R"(<style value="color:red;fill:blue;stroke:green;font-size:20pt" padding="9pt"/>)",
+    {kLine, "visualizationStyle",
+     R"(<style value="color:red;fill:blue;stroke:green;font-size:20pt" padding="9pt"/>)",
      "color=blue|color2=green|font-size=20pt|padding=9pt"},
     // Stroke and fill are guarded by the property they write.
     {kLine, "tickLabelStyle", R"(<style value="stroke:red"/>)", "color=black", kPlain},
     {kLine, "legendStyle", R"(<style value="stroke:red;fill:blue"/>)", "color=white|color2=black", kPlain},
     // A source preferred size blocks the size, a source minimum the minimum.
-    {kLine, "tickLabelStyle", R"(<style value="font-size:20pt;min-font-size:6pt"/>)", "font-size=8pt;6pt", kPlain},
+    {kLine, "tickLabelStyle", R"(<style value="font-size:20pt;min-font-size:6pt"/>)", "font-size=8pt;6pt",
+     kPlain},
     {kLine, "axisLabelStyle", R"(<style value="min-font-size:1pt" font-size="2pt;3pt;4pt"/>)",
      "font-size=9pt;7pt;10pt", kPlain},
     {kLine, "gridStyle", R"(<style font-size="11pt;9pt;13pt"/>)", "font-size=11pt;7pt;13pt",
      R"(<style value="min-font-size:7pt"/>)", R"(<style value="min-font-size:7pt"/>)"},
     {kBar, "barStyle", R"(<style value="max-width:95%;width:1%"/>)", "width=60%;10%;90%", kPlain},
     {kLine, "titleStyle", R"(<style textAlignment="right"/>)", "textAlignment=center", kPlain},
-    {kLine, "frameStyle", R"(<style><shadow color="red" dx="9px"/></style>)", "shadow-color=gray|shadow-dx=2px",
-     R"(<style><shadow color="gray" dx="2px"/></style>)", R"(<style><shadow color="gray" dx="2px"/></style>)"},
+    {kLine, "frameStyle", R"(<style><shadow color="red" dx="9px"/></style>)",
+     "shadow-color=gray|shadow-dx=2px", kGrayShadow, kGrayShadow},
     // An interval glyph sets the symbol even over the source; a plain glyph does not.
-    {kBar, "barStyle", R"(<style><intervalGlyph type="cross"/></style>)", "symbol=cross", R"(<style symbol="square"/>)"},
-    {kBar, "barStyle", R"(<style><glyph type="circle"/></style>)", "symbol=cross", R"(<style symbol="square"/>)",
+    {kBar, "barStyle", R"(<style><intervalGlyph type="cross"/></style>)", "symbol=cross",
+     R"(<style symbol="square"/>)"},
+    {kBar, "barStyle", R"(<style><glyph type="circle"/></style>)", "symbol=cross",
+     R"(<style symbol="square"/>)",
      R"(<style><intervalGlyph type="cross"/></style>)"},
 };
 // clang-format on
