@@ -157,8 +157,9 @@ TEST(DataStreamHostile, EveryTruncationAndTrailingByteFails) {
             EXPECT_FALSE(readInto(back, compressed(raw.substr(0, n)))) << "raw cut at " << n;
             EXPECT_FALSE(readInto(back, raw.substr(0, n))) << "uncompressed cut at " << n;
         }
-        if (n < packed.size())
+        if (n < packed.size()) {
             EXPECT_FALSE(readInto(back, packed.substr(0, n))) << "compressed cut at " << n;
+        }
     }
     VarDataProcessor back;
     EXPECT_TRUE(readInto(back, packed));
