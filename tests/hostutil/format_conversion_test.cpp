@@ -67,10 +67,10 @@ protected:
         SCOPED_TRACE(where);
         ASSERT_TRUE(row.convert(*format, host(row.type, row.width, row.decimals)));
         const Attributes all = attributes();
-        const std::u16string spec = row.expect;
-        for (std::size_t from = 0; from <= spec.size();) {
-            const std::size_t bar = std::min(spec.find(u'|', from), spec.size());
-            std::u16string item = spec.substr(from, bar - from);
+        const std::u16string wanted = row.expect;
+        for (std::size_t from = 0; from <= wanted.size();) {
+            const std::size_t bar = std::min(wanted.find(u'|', from), wanted.size());
+            std::u16string item = wanted.substr(from, bar - from);
             from = bar + 1;
             const char16_t mode = item[0] == u'!' || item[0] == u'-' || item[0] == u'+' ? item[0] : 0;
             if (mode)
