@@ -52,16 +52,6 @@ private:
     std::vector<plotaid::detail::OwnedDocument> documents_;
 };
 
-// Every style of a chart that has an id, in document order.
-inline std::vector<GrxStyle*> stylesWithIds(const Chart& chart) {
-    std::vector<GrxStyle*> styles;
-    XERCES_CPP_NAMESPACE::DOMNodeList* nodes = chart.document()->getElementsByTagName(u"style");
-    for (XMLSize_t i = 0; i < nodes->getLength(); ++i)
-        if (GrxStyle* s = GrxBaseElement::wrapperOf<GrxStyle>(nodes->item(i)); s && *s->getId())
-            styles.push_back(s);
-    return styles;
-}
-
 } // namespace styleimport_test
 
 #endif

@@ -61,115 +61,81 @@ const char* const kGrayShadow = R"(<style><shadow color="gray" dx="2px"/></style
 const Row kRows[] = {
     // The CSS-like text wins over the attribute, which is copied otherwise.
     {kLine, "tickLabelStyle", R"(<style value="color:#102030;stroke-width:2pt" color="red" color2="blue"
-        stroke-width="9pt" padding="1pt" margin="2pt" symbol="circle" depth="3" font-family="Serif"
-        labelLocationHorizontal="center"/>)",
-     "color=#102030|stroke-width=2pt|color2=blue|padding=1pt|margin=2pt|symbol=circle|depth=3|"
-     "font-family=Serif|labelLocationHorizontal=center|font-size=8pt"},
+        stroke-width="9pt" padding="1pt" symbol="circle" labelLocationHorizontal="center"/>)",
+     "color=#102030|stroke-width=2pt|color2=blue|padding=1pt|symbol=circle|labelLocationHorizontal=center|"
+     "font-size=8pt"},
     // The library's own property names write the object model's attributes.
     {kLine, "tickLabelStyle", "<style value=\"label-location-x:left;label-location-y:top;"
-        "label-location-inside:1;text-fit:shrink;font-style:italic;stroke-linecap:butt;glyph-angle:45;"
-        "shadow:gray;shadow-dx:1px;shadow-dy:2px;size:5pt\"/>",
+        "label-location-inside:1;text-fit:shrink;stroke-linecap:butt;shadow:gray;shadow-dy:2px;size:5pt\"/>",
      "labelLocationHorizontal=left|labelLocationVertical=top|labelInside=1|text-fit=shrink|"
-     "font-style=italic|stroke-linecap=butt|glyph-angle=45|shadow-color=gray|shadow-dx=1px|"
-     "shadow-dy=2px|size=5pt"},
+     "stroke-linecap=butt|shadow-color=gray|shadow-dy=2px|size=5pt"},
     {kLine, "gridStyle", R"(<style value="stroke-dasharray:none" stroke-dasharray="4 2"/>)",
      "stroke-dasharray=4 2"},
-    {kLine, "axisStyle", R"(<style value="stroke-dasharray:6 1" stroke-dasharray="4 2"/>)",
-     "stroke-dasharray=6 1"},
     // Lines take the stroke as their colour, over a CSS colour too, and never a fill.
     {kLine, "lineStyle", R"(<style value="stroke:red;fill:blue"/>)", "color=red|color2=#3E58AC|fill=-"},
     {kLine, "tickLabelStyle", R"(<style value="color:navy;stroke:olive"/>)", "color=olive"},
-    // Filled areas: the chart's own, an interval's, a graph's cell, a box hinge, a legend, a slice.
+    // Filled areas (the chart's own, an interval's, a box hinge) take fill and stroke; a box's own
+    // style and an area's are not among them.
     {kLine, "visualizationStyle", kNavyRedBlue, "color=blue|color2=red"},
     {kBar, "barStyle", kNavyRedBlue, "color=blue|color2=red"},
-    {"area.xml", "graphStyle", kNavyRedBlue, "color=blue|color2=red"},
     {"boxplot.xml", "hingeStyle", kNavyRedBlue, "color=blue|color2=red"},
-    {kScatter, "legendStyle", kNavyRedBlue, "color=blue|color2=red"},
-    {"pie.xml", "sliceStyle", kNavyRedBlue, "color=blue|color2=red"},
-    // A box's own style and an area's are not among them.
-    {"boxplot.xml", "boxStyle", R"(<style value="stroke:red;fill:blue"/>)", "color=red|color2=black"},
-    {"area.xml", "areaStyle", R"(<style value="stroke:red;fill:blue"/>)", "color=red|color2=black"},
+    {"boxplot.xml", "boxStyle", kNavyRedBlue, "color=red|color2=black"},
+    {"area.xml", "areaStyle", kNavyRedBlue, "color=red|color2=black"},
     // Font weight: CSS "normal" (exactly) is regular, any other word bold; attributes alike.
     {kLine, "titleStyle", R"(<style value="font-weight:normal"/>)", "font-weight=regular"},
     {kLine, "tickLabelStyle", R"(<style value="font-weight:600" font-weight="normal"/>)", "font-weight=bold"},
     {kLine, "axisStyle", R"(<style value="font-weight:Normal"/>)", "font-weight=bold"},
     {kLine, "legendTextStyle", R"(<style font-weight="normal"/>)", "font-weight=regular"},
-    {kLine, "footnoteStyle", R"(<style font-weight="bold"/>)", "font-weight=bold"},
     // Visibility.
     {kLine, "gridStyle", R"(<style value="visibility:hidden"/>)", "visible=false"},
-    {kLine, "gridStyle", R"(<style value="visibility:false"/>)", "visible=false"},
     {kLine, "gridStyle", R"(<style value="visibility:visible" visible="false"/>)", "visible=true"},
-    {kLine, "axisStyle", R"(<style visible="false"/>)", "visible=false"},
     // Font sizes: the CSS size is the preferred part, the attribute gives all three.
     {kLine, "titleStyle", R"(<style value="font-size:16pt"/>)", "font-size=16pt;10pt;14pt"},
-    {kLine, "axisLabelStyle", R"(<style font-size="11pt;8pt;13pt"/>)", "font-size=11pt;8pt;13pt"},
-    {kLine, "tickLabelStyle", R"(<style value="min-font-size:6pt"/>)", "font-size=8pt;6pt"},
     {kLine, "legendTextStyle", R"(<style value="font-size:10pt" font-size="1pt;5pt"/>)",
      "font-size=10pt;5pt"},
+    {kLine, "tickLabelStyle", R"(<style value="min-font-size:6pt"/>)", "font-size=8pt;6pt"},
     // Widths go into their parts.
     {kBar, "barStyle", R"(<style value="max-width:95%"/>)", "width=60%;10%;95%"},
     {kBar, "barStyle", R"(<style value="width:70%"/>)", "width=70%;10%;90%"},
-    {kBar, "legendStyle", R"(<style width="3cm"/>)", "width=3cm"},
     // Glyph sides from 2 to 100 only; a glyph child sets only what it says.
     {kScatter, "legendStyle", R"(<style><glyph sides="1"/></style>)", "glyph-sides=-"},
     {kScatter, "legendStyle", R"(<style><glyph sides="101"/></style>)", "glyph-sides=-"},
-    {kScatter, "legendStyle", R"(<style value="glyph-sides:0"/>)", "glyph-sides=-"},
     {kScatter, "legendStyle", R"(<style value="glyph-sides:-3"/>)", "glyph-sides=-"},
     {kScatter, "legendStyle", R"(<style><glyph sides="2"/></style>)", "glyph-sides=2"},
-    {kScatter, "legendStyle", R"(<style><glyph sides="100"/></style>)", "glyph-sides=100"},
-    {kScatter, "legendStyle", R"(<style value="glyph-sides:5"/>)", "glyph-sides=5"},
-    {kScatter, "legendStyle", R"(<style><glyph angle="30" aspect="0.5" size="6pt" type="diamond"/></style>)",
-     "glyph-angle=30|glyph-aspect=0.5|size=6pt|symbol=diamond"},
-    {kScatter, "legendStyle", R"(<style><glyph sides="4"/></style>)",
-     "glyph-sides=4|glyph-angle=-|symbol=-|size=-"},
-    // Aspect, pattern and shadow opacity must read as what they are.
-    {kScatter, "legendStyle", R"(<style><glyph aspect="-1"/></style>)", "glyph-aspect=-"},
+    {kScatter, "legendStyle", R"(<style value="glyph-sides:100"/>)", "glyph-sides=100"},
+    {kScatter, "legendStyle", R"(<style><glyph sides="4" aspect="0.5"/></style>)",
+     "glyph-sides=4|glyph-aspect=0.5|glyph-angle=-|symbol=-|size=-"},
+    // Aspect, pattern and opacities must read as what they are.
     {kBar, "barStyle", R"(<style value="fill-pattern:-2;glyph-aspect:-1"/>)", "pattern=-|glyph-aspect=-"},
-    {kBar, "barStyle", R"(<style value="glyph-aspect:2" pattern="3"/>)", "pattern=3|glyph-aspect=2"},
     {kLine, "frameStyle", R"(<style value="shadow-opacity:2"/>)", "shadow-opacity=-"},
-    {kLine, "frameStyle", R"(<style value="shadow-opacity:-1"/>)", "shadow-opacity=-"},
     {kLine, "frameStyle", R"(<style value="shadow-opacity:0.5"/>)", "shadow-opacity=0.5"},
-    {kLine, "frameStyle", R"(<style shadow-opacity="1"/>)", "shadow-opacity=1"},
-    {kLine, "frameStyle", R"(<style><shadow color="gray" dx="2px" dy="3px" opacity="0.25"/></style>)",
-     "shadow-color=gray|shadow-dx=2px|shadow-dy=3px|shadow-opacity=0.25"},
-    // Attribute-only properties, with the opacity check.
-    {kBar, "barStyle", R"(<style gradient-method="linear" gradient-angle="90" gradient-opacity="0.5"
-        opacity2="3" opacity="0.7" margin-left="1pt" padding-bottom="2pt" textAlignment="right"
-        maxAttachedTextWidth="20%" stroke-opacity="0.4"/>)",
-     "gradient-method=linear|gradient-angle=90|gradient-opacity=0.5|opacity2=-|opacity=0.7|margin-left=1pt|"
-     "padding-bottom=2pt|textAlignment=right|maxAttachedTextWidth=20%|stroke-opacity=0.4"},
+    {kLine, "frameStyle", R"(<style><shadow color="gray" dx="2px" opacity="0.25"/></style>)",
+     "shadow-color=gray|shadow-dx=2px|shadow-opacity=0.25"},
+    {kBar, "barStyle", R"(<style gradient-method="linear" opacity2="3" opacity="0.7" margin-left="1pt"/>)",
+     "gradient-method=linear|opacity2=-|opacity=0.7|margin-left=1pt"},
     // A style without a gradient colour removes the chart's one; the source's stays.
     {kBar, "barStyle", R"(<style value="color:red"/>)", "gradient-color=-", nullptr, kYellow},
     {kBar, "barStyle", R"(<style gradient-color="green"/>)", "gradient-color=yellow", kYellow, kYellow},
-    {kBar, "barStyle", R"(<style/>)", "gradient-color=yellow", kYellow, kYellow},
 
     // Under the source guard, what the chart's own definition sets stays.
     {kLine, "visualizationStyle",
      R"(<style value="color:red;fill:blue;stroke:green;font-size:20pt" padding="9pt"/>)",
      "color=white|color2=green|font-size=9pt|padding=3pt", kPlain},
-    {kLine, "visualizationStyle",
-     R"(<style value="color:red;fill:blue;stroke:green;font-size:20pt" padding="9pt"/>)",
-     "color=blue|color2=green|font-size=20pt|padding=9pt"},
-    // Stroke and fill are guarded by the property they write.
+    // Stroke is guarded by the property it writes.
     {kLine, "tickLabelStyle", R"(<style value="stroke:red"/>)", "color=black", kPlain},
-    {kLine, "legendStyle", R"(<style value="stroke:red;fill:blue"/>)", "color=white|color2=black", kPlain},
     // A source preferred size blocks the size, a source minimum the minimum.
     {kLine, "tickLabelStyle", R"(<style value="font-size:20pt;min-font-size:6pt"/>)", "font-size=8pt;6pt",
      kPlain},
-    {kLine, "axisLabelStyle", R"(<style value="min-font-size:1pt" font-size="2pt;3pt;4pt"/>)",
-     "font-size=9pt;7pt;10pt", kPlain},
     {kLine, "gridStyle", R"(<style font-size="11pt;9pt;13pt"/>)", "font-size=11pt;7pt;13pt",
      R"(<style value="min-font-size:7pt"/>)", R"(<style value="min-font-size:7pt"/>)"},
     {kBar, "barStyle", R"(<style value="max-width:95%;width:1%"/>)", "width=60%;10%;90%", kPlain},
-    {kLine, "titleStyle", R"(<style textAlignment="right"/>)", "textAlignment=center", kPlain},
     {kLine, "frameStyle", R"(<style><shadow color="red" dx="9px"/></style>)",
      "shadow-color=gray|shadow-dx=2px", kGrayShadow, kGrayShadow},
     // An interval glyph sets the symbol even over the source; a plain glyph does not.
     {kBar, "barStyle", R"(<style><intervalGlyph type="cross"/></style>)", "symbol=cross",
      R"(<style symbol="square"/>)"},
     {kBar, "barStyle", R"(<style><glyph type="circle"/></style>)", "symbol=cross",
-     R"(<style symbol="square"/>)",
-     R"(<style><intervalGlyph type="cross"/></style>)"},
+     R"(<style symbol="square"/>)", R"(<style><intervalGlyph type="cross"/></style>)"},
 };
 // clang-format on
 
@@ -238,15 +204,9 @@ TEST_F(StyleImport, AnUnsupportedChildIsReportedAndTheRestStillApplies) {
     EXPECT_EQ(message.rfind("Unsupported style child encountered (<bogus", 0), 0u) << message;
     EXPECT_NE(message.find("a=\"1\""), std::string::npos) << message;
     EXPECT_EQ(message.back(), ')');
-    const std::string logged = readAll(logs.file("chartxml_error.log"));
-    EXPECT_NE(logged.find("backend/chartxml/plotaid/src/templates/basetemplate, line 4672"),
-              std::string::npos)
-        << logged;
-
-    // A null element changes nothing.
-    const std::string before = chart.vis->AsUTF8();
-    Probe(nullptr, *chart.vis, nullptr).importStyle(nullptr, *s);
-    EXPECT_EQ(chart.vis->AsUTF8(), before);
+    EXPECT_NE(readAll(logs.file("chartxml_error.log"))
+                  .find("backend/chartxml/plotaid/src/templates/basetemplate, line 4672"),
+              std::string::npos);
 }
 
 TEST_F(StyleImport, ImportingTwiceGivesTheSameChartAsOnce) {
@@ -258,13 +218,12 @@ TEST_F(StyleImport, ImportingTwiceGivesTheSameChartAsOnce) {
              <interpolation type="step" pointPosition="right" missingRepresentation="gap"/>
            </style>)";
     for (const bool withSource : {false, true}) {
-        for (const char* name : {"line-series.xml", "simple-bar.xml", "area.xml", "boxplot.xml"}) {
+        for (const char* name : {"line-series.xml", "boxplot.xml"}) {
             SCOPED_TRACE(std::string(name) + (withSource ? " with source" : ""));
             const Chart source = sample(name);
             Chart once = sample(name);
             Chart twice = sample(name);
-            for (const char16_t* id : {u"lineStyle", u"barStyle", u"areaStyle", u"hingeStyle",
-                                       u"visualizationStyle", u"titleStyle"}) {
+            for (const char16_t* id : {u"lineStyle", u"hingeStyle", u"visualizationStyle"}) {
                 if (!once.vis->getStyleById(id))
                     continue;
                 for (int i = 0; i < 3; ++i)
