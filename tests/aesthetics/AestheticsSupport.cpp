@@ -1,10 +1,6 @@
 #include "AestheticsSupport.h"
 
-#include <plotaid/ChartException.h>
-#include <plotaid/ChartTemplate.h>
-
 #include <map>
-#include <set>
 
 using namespace XERCES_CPP_NAMESPACE;
 
@@ -15,11 +11,9 @@ namespace {
 std::map<std::string, std::string> attributesOf(const DOMElement* e, bool withId) {
     std::map<std::string, std::string> out;
     const DOMNamedNodeMap* map = e->getAttributes();
-    for (XMLSize_t i = 0; i < map->getLength(); ++i) {
-        const std::string name = text(map->item(i)->getNodeName());
-        if (withId || name != "id")
-            out[name] = text(map->item(i)->getNodeValue());
-    }
+    for (XMLSize_t i = 0; i < map->getLength(); ++i)
+        if (withId || text(map->item(i)->getNodeName()) != "id")
+            out[text(map->item(i)->getNodeName())] = text(map->item(i)->getNodeValue());
     return out;
 }
 
@@ -40,29 +34,22 @@ std::string describeStyles(const DOMElement* styleCycle) {
     return out + "]";
 }
 
-void writeCanonical(const DOMElement* e, const DOMDocument* document, std::string& out, int depth) {
+void writeCanonical(const DOMElement* e, std::string& out, int depth) {
     const std::string name = text(e->getTagName());
     if (depth == 1 && name == "styleCycle")
         return;
     out += std::string(static_cast<std::size_t>(depth) * 2, ' ') + "<" + name;
     for (const auto& [attr, value] : attributesOf(e, true)) {
-        if (attr == "cycle") {
-            const DOMElement* referred = document->getElementById(ChartString(value).xc_str());
-            out += " cycle=" + (referred != nullptr ? describeStyles(referred) : "dangling:" + value);
-        } else {
-            out += " " + attr + "=\"" + value + "\"";
-        }
+        const DOMElement* referred =
+            attr == "cycle" ? e->getOwnerDocument()->getElementById(ChartString(value).xc_str()) : nullptr;
+        out += " " + attr + "=" + (referred != nullptr ? describeStyles(referred) : "\"" + value + "\"");
     }
     out += ">\n";
-    for (const DOMNode* n = e->getFirstChild(); n != nullptr; n = n->getNextSibling()) {
-        if (n->getNodeType() == DOMNode::ELEMENT_NODE) {
-            writeCanonical(static_cast<const DOMElement*>(n), document, out, depth + 1);
-        } else if (n->getNodeType() == DOMNode::TEXT_NODE) {
-            const std::string t = text(n->getNodeValue());
-            if (t.find_first_not_of(" \t\r\n") != std::string::npos)
-                out += std::string(static_cast<std::size_t>(depth + 1) * 2, ' ') + t + "\n";
-        }
-    }
+    for (const DOMNode* n = e->getFirstChild(); n != nullptr; n = n->getNextSibling())
+        if (n->getNodeType() == DOMNode::ELEMENT_NODE)
+            writeCanonical(static_cast<const DOMElement*>(n), out, depth + 1);
+        else if (n->getNodeType() == DOMNode::TEXT_NODE)
+            out += text(n->getNodeValue());
 }
 
 const GrxStyleCycle* cycleOf(const GrxVisualization& chart, const std::string& aestheticId) {
@@ -81,61 +68,26 @@ std::string templateOf(const std::string& body) {
            body + "</template>";
 }
 
-std::vector<plotaid::detail::InstructionOutcome>
-applyTemplate(GrxVisualization& target, const std::string& body, GrxVisualization* source) {
-    plotaid::detail::WalkReport report;
-    ChartTemplate chartTemplate(target, source);
-    EXPECT_TRUE(chartTemplate.setTemplate(templateOf(body))) << body;
-    chartTemplate.applyTemplate();
-    return report.outcomes();
-}
-
 std::string chartWith(const std::string& graphBody, const std::string& extra) {
     return "<?xml version=\"1.0\" encoding=\"UTF-8\"?>\n"
            "<visualization xmlns=\"http://plotaid.org/grxml\" "
            "xmlns:xsi=\"http://www.w3.org/2001/XMLSchema-instance\" "
            "xsi:schemaLocation=\"http://plotaid.org/grxml http://plotaid.org/grxml/grxml-2.9.xsd\" "
            "id=\"visualization\">\n"
-           "  <style id=\"plainStyle\" color=\"#112233\"/>\n"
-           "  <style id=\"otherStyle\" color2=\"#445566\"/>\n"
-           "  <sourceVariable id=\"var_a\" source=\"data\" sourceName=\"a\" categorical=\"1\"/>\n"
-           "  <sourceVariable id=\"var_b\" source=\"data\" sourceName=\"b\" categorical=\"0\"/>\n"
-           "  <categoricalDomain id=\"domain_a\"><variableReference "
-           "variable=\"var_a\"/></categoricalDomain>\n"
-           "  <styleCycle id=\"chartCycle\"><cycle><style color=\"red\"/><style "
-           "color=\"blue\"/></cycle></styleCycle>\n"
-           "  <graph id=\"graph_1\">\n"
-           "    <coordinates id=\"coordinates_1\"><dimension id=\"dim_x\"/><dimension "
-           "id=\"dim_y\"/></coordinates>\n" +
-           graphBody + "  </graph>\n" + extra + "  <userSource id=\"data\"/>\n</visualization>\n";
+           "<style id=\"plainStyle\" color=\"#112233\"/><style id=\"otherStyle\" color2=\"#445566\"/>\n"
+           "<sourceVariable id=\"var_a\" source=\"data\" sourceName=\"a\" categorical=\"1\"/>\n"
+           "<sourceVariable id=\"var_b\" source=\"data\" sourceName=\"b\" categorical=\"0\"/>\n"
+           "<categoricalDomain id=\"domain_a\"><variableReference variable=\"var_a\"/></categoricalDomain>\n"
+           "<styleCycle id=\"chartCycle\"><cycle><style color=\"red\"/><style color=\"blue\"/></cycle>"
+           "</styleCycle>\n<graph id=\"graph_1\"><coordinates id=\"coordinates_1\"><dimension "
+           "id=\"dim_x\"/><dimension id=\"dim_y\"/></coordinates>\n" +
+           graphBody + "</graph>\n" + extra + "<userSource id=\"data\"/>\n</visualization>\n";
 }
 
 std::string canonical(const GrxVisualization& chart) {
-    const GrxBaseElement& root = chart;
     std::string out;
-    writeCanonical(root.getImplementation(), root.getImplementation()->getOwnerDocument(), out, 0);
+    writeCanonical(static_cast<const GrxBaseElement&>(chart).getImplementation(), out, 0);
     return out;
-}
-
-std::size_t orphanedStyleCycles(const GrxVisualization& chart) {
-    const GrxBaseElement& root = chart;
-    std::set<std::string> referred;
-    const DOMNodeList* all = root.getImplementation()->getElementsByTagName(u"*");
-    for (XMLSize_t i = 0; i < all->getLength(); ++i)
-        for (const auto& [name, value] : attributesOf(static_cast<const DOMElement*>(all->item(i)), false))
-            referred.insert(value);
-    std::size_t orphans = 0;
-    for (const GrxStyleCycle* cycle : chart.getStyleCycles())
-        orphans += referred.count(text(cycle->getId())) == 0 ? 1 : 0;
-    return orphans;
-}
-
-std::string text(const XMLCh* value) {
-    return ChartString(value).toUTF8();
-}
-
-std::string attribute(const GrxBaseElement& element, const std::string& name) {
-    return text(element.GetAttribute(ChartString(name).xc_str()));
 }
 
 std::string cycleIdOf(const GrxVisualization& chart, const std::string& aestheticId) {

@@ -1,8 +1,6 @@
-// "setDash", "setShape", "setPattern" and "setSize": a new cycle per selected aesthetic, the white
-// fill under patterns, and sizes given as explicit length mappings.
+// "setDash", "setShape", "setPattern" and "setSize": a new cycle per selected aesthetic (the guard
+// they share with every cycle action), the white fill under patterns, sizes as length mappings.
 #include "AestheticsSupport.h"
-
-#include "templates/actions/aesthetics.h"
 
 using namespace aesthetics_test;
 using plotaid::detail::TSetDash;
@@ -15,129 +13,77 @@ namespace {
 const std::string kDashes = "<cycle><style stroke-dasharray='4 4'/><style stroke-dasharray='1 3'/></cycle>";
 const std::string kDashStyles = "[({stroke-dasharray=4 4;}{stroke-dasharray=1 3;})]";
 const std::string kSetDash = "<setDash>" + kDashes + "</setDash>";
-const std::string kSetShape = "<setShape><cycle><style symbol='triangle'/></cycle></setShape>";
 
-// Two lines with a dash each and a point with a shape and a size.
+// Two lines with a dash each, a point with a shape and a size, patterns on a styled interval and
+// on an area without a style.
 const std::string kSeries = chartWith(
     "<line id='line_1' coordinates='coordinates_1'><dash id='dash_1' variable='var_a' cycle='chartCycle'/>"
     "<size id='lineSize' variable='var_b' low='1pt' high='3pt'/></line>"
-    "<line id='line_2' coordinates='coordinates_1'><dash id='dash_2' variable='var_a' "
-    "cycle='chartCycle'/></line>"
-    "<point id='point_1' coordinates='coordinates_1'><shape id='shape_1' variable='var_a' "
-    "cycle='chartCycle'/>"
-    "<size id='pointSize' variable='var_b' low='2pt' high='8pt' cycle='chartCycle' "
-    "domain='domain_a'/></point>");
+    "<line id='line_2' style='otherStyle' coordinates='coordinates_1'><dash id='dash_2' variable='var_a' "
+    "cycle='chartCycle'/></line><point id='point_1' coordinates='coordinates_1'><shape id='shape_1' "
+    "variable='var_a' cycle='chartCycle'/><size id='pointSize' variable='var_b' low='2pt' high='8pt' "
+    "cycle='chartCycle' domain='domain_a'/></point><interval id='styled' style='plainStyle' "
+    "coordinates='coordinates_1'><pattern id='pattern_1' variable='var_a' cycle='chartCycle'/></interval>"
+    "<area id='bare' coordinates='coordinates_1'><pattern id='pattern_2' variable='var_a'/></area>");
 
-using SetDashAndShape = AestheticsTest;
+using SetCycles = AestheticsTest;
 
-TEST_F(SetDashAndShape, EachSelectedAestheticGetsACycleOfItsOwn) {
+TEST_F(SetCycles, EachSelectedDashOrShapeGetsACycleOfItsOwn) {
     GrxVisualization& chart = parse(kSeries);
     const std::size_t cyclesBefore = chart.getStyleCycles().size();
     EXPECT_TRUE(applyAction<TSetDash>(kSetDash, chart));
-    // Unlike colours, two lines do not share: one cycle each.
+    // Unlike colours, two lines do not share.
     EXPECT_EQ(chart.getStyleCycles().size(), cyclesBefore + 2);
     EXPECT_NE(cycleIdOf(chart, "dash_1"), cycleIdOf(chart, "dash_2"));
-    EXPECT_EQ(stylesOf(chart, "dash_1"), kDashStyles);
     EXPECT_EQ(stylesOf(chart, "dash_2"), kDashStyles);
-    // Shapes and sizes are not dashes.
     EXPECT_EQ(cycleIdOf(chart, "shape_1"), "chartCycle");
     EXPECT_EQ(cycleIdOf(chart, "pointSize"), "chartCycle");
-    // Nor are colours and style-bys.
-    GrxVisualization& lines = sample("line-series.xml");
-    EXPECT_TRUE(applyAction<TSetDash>(kSetDash, lines));
-    EXPECT_EQ(stylesOf(lines, "dash_1"), kDashStyles);
-    EXPECT_EQ(cycleIdOf(lines, "color_1"), "styleCycleColor");
-    EXPECT_EQ(cycleIdOf(lines, "styleBy_dash"), "styleCycleDash");
 
-    EXPECT_TRUE(applyAction<TSetShape>(kSetShape, chart));
+    EXPECT_TRUE(
+        applyAction<TSetShape>("<setShape><cycle><style symbol='triangle'/></cycle></setShape>", chart));
     EXPECT_EQ(stylesOf(chart, "shape_1"), "[({symbol=triangle;})]");
     EXPECT_EQ(stylesOf(chart, "dash_1"), kDashStyles);
-}
 
-TEST_F(SetDashAndShape, AnAestheticNumberAMissingCycleAndTheLastCycleChildDecide) {
-    GrxVisualization& chart = parse(kSeries);
-    const std::string before = chart.AsUTF8();
-    EXPECT_TRUE(applyAction<TSetDash>("<setDash aestheticNumber='2'>" + kDashes + "</setDash>", chart));
-    EXPECT_TRUE(applyAction<TSetDash>("<setDash/>", chart));
-    EXPECT_TRUE(applyAction<TSetShape>("<setShape><style symbol='square'/></setShape>", chart));
-    EXPECT_EQ(chart.AsUTF8(), before);
-
+    // The last cycle child counts; a number past the list, or no cycle at all, changes nothing.
+    GrxVisualization& other = parse(kSeries);
+    const std::string before = other.AsUTF8();
+    EXPECT_TRUE(applyAction<TSetDash>("<setDash aestheticNumber='2'>" + kDashes + "</setDash>", other));
+    EXPECT_TRUE(applyAction<TSetDash>("<setDash><style stroke-dasharray='9 9'/></setDash>", other));
+    EXPECT_EQ(other.AsUTF8(), before);
     EXPECT_TRUE(applyAction<TSetDash>(
-        "<setDash><cycle><style stroke-dasharray='9 9'/></cycle>" + kDashes + "</setDash>", chart));
-    EXPECT_EQ(stylesOf(chart, "dash_1"), kDashStyles);
+        "<setDash><cycle><style stroke-dasharray='9 9'/></cycle>" + kDashes + "</setDash>", other));
+    EXPECT_EQ(stylesOf(other, "dash_1"), kDashStyles);
 }
 
-TEST_F(SetDashAndShape, TheSourceGuardsEachAestheticItGivesACycle) {
+TEST_F(SetCycles, TheSourceGuardsEachAestheticItGivesACycle) {
     GrxVisualization& chart = parse(kSeries);
     GrxVisualization& source = parse(kSeries);
     byId<GrxDash>(source, "dash_2")->removeCycle();
     EXPECT_TRUE(applyAction<TSetDash>(kSetDash, chart, &source));
     EXPECT_EQ(cycleIdOf(chart, "dash_1"), "chartCycle");
     EXPECT_EQ(stylesOf(chart, "dash_2"), kDashStyles);
-
-    const std::string before = chart.AsUTF8();
-    EXPECT_TRUE(applyAction<TSetShape>(kSetShape, chart, &source));
-    EXPECT_EQ(chart.AsUTF8(), before);
 }
 
-// ---- setPattern ---------------------------------------------------------------------------------
-
-const std::string kPatterns =
-    chartWith("<interval id='styled' style='plainStyle' coordinates='coordinates_1'>"
-              "<pattern id='pattern_1' variable='var_a' cycle='chartCycle'/></interval>"
-              "<area id='bare' coordinates='coordinates_1'><pattern id='pattern_2' variable='var_a'/></area>"
-              "<line id='plain' style='otherStyle' coordinates='coordinates_1'/>");
-const std::string kSetPattern =
-    "<setPattern><cycle><style pattern='3'/><style pattern='5'/></cycle></setPattern>";
-const std::string kPatternStyles = "[({pattern=3;}{pattern=5;})]";
-
-using SetPattern = AestheticsTest;
-
-TEST_F(SetPattern, PatternsGetANewCycleOverAWhiteFillOnce) {
-    GrxVisualization& chart = parse(kPatterns);
-    EXPECT_TRUE(applyAction<TSetPattern>(kSetPattern, chart));
-    EXPECT_EQ(stylesOf(chart, "pattern_1"), kPatternStyles);
-    EXPECT_EQ(stylesOf(chart, "pattern_2"), kPatternStyles);
-    // Without a source the chart's own style colour gives way to white.
+TEST_F(SetCycles, PatternsGetANewCycleOverAWhiteFillUnlessTheSourceStyleHasAColour) {
+    const std::string setPattern = "<setPattern><cycle><style pattern='3'/></cycle></setPattern>";
+    GrxVisualization& chart = parse(kSeries);
+    EXPECT_TRUE(applyAction<TSetPattern>(setPattern, chart));
+    EXPECT_EQ(stylesOf(chart, "pattern_1"), "[({pattern=3;})]");
     EXPECT_EQ(attribute(*byId<GrxStyle>(chart, "plainStyle"), "color"), "white");
-    // An element without a style gets one of the template's, white, in the container.
-    GrxStyle* made = byId<GrxArea>(chart, "bare")->getStyle();
-    ASSERT_NE(made, nullptr);
-    EXPECT_EQ(attribute(*made, "color"), "white");
-    const auto* holder =
-        static_cast<const XERCES_CPP_NAMESPACE::DOMElement*>(made->getImplementation()->getParentNode());
-    EXPECT_EQ(text(holder->getAttribute(u"id")), "c-o-n-t-a-i-n-er");
-    // No pattern on the line: its style keeps its colours.
+    // An element without a style gets a new white one; no pattern on a line, no white there.
+    ASSERT_NE(byId<GrxArea>(chart, "bare")->getStyle(), nullptr);
+    EXPECT_EQ(attribute(*byId<GrxArea>(chart, "bare")->getStyle(), "color"), "white");
     EXPECT_FALSE(byId<GrxStyle>(chart, "otherStyle")->isColorPresent());
-    EXPECT_EQ(grammar_test::chartFaults(chart), "");
-
     // A second application makes no second style.
     const std::string once = canonical(chart);
-    const std::size_t cycles = chart.getStyleCycles().size();
-    EXPECT_TRUE(applyAction<TSetPattern>(kSetPattern, chart));
+    EXPECT_TRUE(applyAction<TSetPattern>(setPattern, chart));
     EXPECT_EQ(canonical(chart), once);
-    EXPECT_EQ(chart.getStyleCycles().size(), cycles + 2);
+
+    GrxVisualization& guarded = parse(kSeries);
+    EXPECT_TRUE(applyAction<TSetPattern>(setPattern, guarded, &parse(kSeries)));
+    EXPECT_EQ(attribute(*byId<GrxStyle>(guarded, "plainStyle"), "color"), "#112233");
+    EXPECT_EQ(attribute(*byId<GrxArea>(guarded, "bare")->getStyle(), "color"), "white");
 }
-
-TEST_F(SetPattern, ASourceStyleColourStaysAndWithoutACycleTheFillStillTurnsWhite) {
-    GrxVisualization& chart = parse(kPatterns);
-    GrxVisualization& source = parse(kPatterns);
-    EXPECT_TRUE(applyAction<TSetPattern>(kSetPattern, chart, &source));
-    EXPECT_EQ(attribute(*byId<GrxStyle>(chart, "plainStyle"), "color"), "#112233");
-    // The source sets pattern_1's cycle, so it stays; pattern_2 has none there and is replaced.
-    EXPECT_EQ(cycleIdOf(chart, "pattern_1"), "chartCycle");
-    EXPECT_EQ(stylesOf(chart, "pattern_2"), kPatternStyles);
-    EXPECT_EQ(attribute(*byId<GrxArea>(chart, "bare")->getStyle(), "color"), "white");
-
-    GrxVisualization& bare = parse(kPatterns);
-    EXPECT_TRUE(applyAction<TSetPattern>("<setPattern/>", bare));
-    EXPECT_EQ(cycleIdOf(bare, "pattern_1"), "chartCycle");
-    EXPECT_EQ(attribute(*byId<GrxStyle>(bare, "plainStyle"), "color"), "white");
-}
-
-// ---- setSize --------------------------------------------------------------------------------------
-
-using SetSize = AestheticsTest;
 
 const std::string kMappings = "<parameter name='small' value='2pt'/><parameter name='large' value='9pt'/>";
 
@@ -148,21 +94,16 @@ std::string mappingsOf(const GrxVisualization& chart, const char* id) {
     return out;
 }
 
-TEST_F(SetSize, ParametersReplaceLowHighCycleAndDomainByMappingsInOrder) {
+TEST_F(SetCycles, SizeParametersReplaceLowHighCycleAndDomainByMappings) {
     GrxVisualization& chart = parse(kSeries);
     EXPECT_TRUE(applyAction<TSetSize>("<setSize>" + kMappings + kDashes + "</setSize>", chart));
-    for (const char* id : {"lineSize", "pointSize"}) {
-        SCOPED_TRACE(id);
-        const GrxSize& size = *byId<GrxSize>(chart, id);
-        EXPECT_EQ(mappingsOf(chart, id), "small=2pt large=9pt ");
-        // The cycle child is ignored then.
-        EXPECT_FALSE(size.isLowPresent() || size.isHighPresent() || size.isCyclePresent() ||
-                     size.isDomainPresent());
-        EXPECT_EQ(attribute(size, "variable"), "var_b");
-    }
-    EXPECT_EQ(grammar_test::chartFaults(chart), "");
+    const GrxSize& size = *byId<GrxSize>(chart, "pointSize");
+    EXPECT_EQ(mappingsOf(chart, "pointSize"), "small=2pt large=9pt ");
+    EXPECT_FALSE(size.isLowPresent() || size.isHighPresent() || size.isCyclePresent() ||
+                 size.isDomainPresent());
+    EXPECT_EQ(attribute(size, "variable"), "var_b");
 
-    // Without parameters the cycle is replaced and the rest stays.
+    // Without parameters only the cycle is replaced.
     GrxVisualization& cycled = parse(kSeries);
     EXPECT_TRUE(applyAction<TSetSize>("<setSize><cycle><style size='5pt'/></cycle></setSize>", cycled));
     EXPECT_EQ(stylesOf(cycled, "pointSize"), "[({size=5pt;})]");
@@ -170,15 +111,13 @@ TEST_F(SetSize, ParametersReplaceLowHighCycleAndDomainByMappingsInOrder) {
     EXPECT_EQ(mappingsOf(cycled, "pointSize"), "");
 }
 
-TEST_F(SetSize, TheElementTypeAndTheSourceChooseWhichSizesChange) {
-    struct Case {
+TEST_F(SetCycles, TheElementTypeChoosesWhichSizesChange) {
+    const struct {
         const char* elementType;
-        bool line;
-        bool point;
-    };
-    for (const Case c : {Case{"line", true, false}, Case{"point", false, true},
-                         Case{"labeling", false, false}, Case{"interval", false, false},
-                         Case{"element", true, true}, Case{"bogus", true, true}, Case{"", true, true}}) {
+        bool line, point;
+    } cases[] = {
+        {"line", true, false}, {"point", false, true}, {"interval", false, false}, {"bogus", true, true}};
+    for (const auto& c : cases) {
         SCOPED_TRACE(c.elementType);
         GrxVisualization& chart = parse(kSeries);
         EXPECT_TRUE(applyAction<TSetSize>(
@@ -186,25 +125,16 @@ TEST_F(SetSize, TheElementTypeAndTheSourceChooseWhichSizesChange) {
         EXPECT_EQ(mappingsOf(chart, "lineSize").empty(), !c.line);
         EXPECT_EQ(mappingsOf(chart, "pointSize").empty(), !c.point);
     }
-    // The point's size has a cycle in the source; the line's has none.
-    GrxVisualization& chart = parse(kSeries);
-    GrxVisualization& source = parse(kSeries);
-    EXPECT_TRUE(applyAction<TSetSize>("<setSize>" + kMappings + "</setSize>", chart, &source));
-    EXPECT_EQ(mappingsOf(chart, "pointSize"), "");
-    EXPECT_EQ(attribute(*byId<GrxSize>(chart, "pointSize"), "low"), "2pt");
-    EXPECT_EQ(mappingsOf(chart, "lineSize"), "small=2pt large=9pt ");
 }
 
-TEST_F(SetSize, MappingsOfAnEarlierApplicationAreReplacedNotExtended) {
+TEST_F(SetCycles, SizeMappingsOfAnEarlierApplicationAreReplacedNotExtended) {
     GrxVisualization& chart = parse(kSeries);
     const std::string instruction = "<setSize elementType='point'>" + kMappings + "</setSize>";
     EXPECT_TRUE(applyAction<TSetSize>(instruction, chart));
     const std::string once = canonical(chart);
     EXPECT_TRUE(applyAction<TSetSize>(instruction, chart));
     EXPECT_EQ(canonical(chart), once);
-    // A later template with other values takes effect instead of landing behind the first one's.
-    EXPECT_TRUE(applyAction<TSetSize>(
-        "<setSize elementType='point'><parameter name='small' value='1pt'/></setSize>", chart));
+    EXPECT_TRUE(applyAction<TSetSize>("<setSize><parameter name='small' value='1pt'/></setSize>", chart));
     EXPECT_EQ(mappingsOf(chart, "pointSize"), "small=1pt ");
 }
 
