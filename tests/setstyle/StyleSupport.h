@@ -78,9 +78,9 @@ inline std::map<std::string, std::string> styleSnapshot(const Chart& chart) {
     std::map<std::string, std::string> out;
     XERCES_CPP_NAMESPACE::DOMNodeList* nodes = chart.document()->getElementsByTagName(u"style");
     for (XMLSize_t i = 0; i < nodes->getLength(); ++i) {
-        auto* e = static_cast<XERCES_CPP_NAMESPACE::DOMElement*>(nodes->item(i));
-        XERCES_CPP_NAMESPACE::DOMNamedNodeMap* map = e->getAttributes();
-        std::string& attributes = out[utf8(e->getAttribute(u"id"))];
+        XERCES_CPP_NAMESPACE::DOMNamedNodeMap* map = nodes->item(i)->getAttributes();
+        std::string& attributes =
+            out[utf8(static_cast<XERCES_CPP_NAMESPACE::DOMElement*>(nodes->item(i))->getAttribute(u"id"))];
         for (XMLSize_t a = 0; a < map->getLength(); ++a)
             attributes += utf8(map->item(a)->getNodeName()) + "=" + utf8(map->item(a)->getNodeValue()) + ";";
     }
@@ -88,15 +88,16 @@ inline std::map<std::string, std::string> styleSnapshot(const Chart& chart) {
 }
 
 // Ids whose styles differ between two snapshots (added, removed or changed), space-separated.
-inline std::string changedStyles(const std::map<std::string, std::string>& before,
+inline std::string changedStyles(std::map<std::string, std::string> before,
                                  const std::map<std::string, std::string>& after) {
     std::string changed;
     for (const auto& [id, text] : after)
         if (const auto old = before.find(id); old == before.end() || old->second != text)
             changed += (changed.empty() ? "" : " ") + id;
+    for (const auto& [id, text] : after)
+        before.erase(id);
     for (const auto& [id, text] : before)
-        if (after.find(id) == after.end())
-            changed += (changed.empty() ? "" : " ") + id;
+        changed += (changed.empty() ? "" : " ") + id;
     return changed;
 }
 
