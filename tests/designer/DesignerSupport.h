@@ -124,11 +124,6 @@ inline std::vector<DOMElement*> cycleStyles(const engine_test::Chart& c, const D
     return elementsNamed(cycle, "style");
 }
 
-// The first part of a compound "preferred;minimum;maximum" value.
-inline std::string preferred(const std::string& compound) {
-    return compound.substr(0, compound.find(';'));
-}
-
 // What the chart's styles say, keyed so that two applications can be compared: a style by its id,
 // a style inside a style cycle by what refers to that cycle (element, id and attribute of each
 // referrer) and its position there. Style cycles nothing refers to any more are left out, as are
