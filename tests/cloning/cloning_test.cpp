@@ -9,7 +9,6 @@
 #include <sstream>
 
 using engine_test::Chart;
-using engine_test::EngineTest;
 
 namespace {
 
@@ -24,12 +23,13 @@ std::string utf8(const XMLCh* s) {
     return ChartString(s).toUTF8();
 }
 
-bool startsWith(const std::string& text, const std::string& start) {
-    return text.compare(0, start.size(), start) == 0;
+// A fresh id: made from `prefix`, and not the id it was copied from.
+bool fresh(const XMLCh* id, const std::string& prefix, const std::string& old) {
+    return utf8(id).rfind(prefix, 0) == 0 && utf8(id) != old;
 }
 
 // The scatter sample: a point with a shape and a colour by gender, both listed by the legend.
-class Cloning : public EngineTest {
+class Cloning : public engine_test::EngineTest {
 protected:
     void SetUp() override {
         chart_ = Chart::parse(engine_test::example("charts/scatter.xml"));
@@ -41,24 +41,25 @@ protected:
         ASSERT_NE(repository_, nullptr);
     }
     Probe probe() { return Probe(nullptr, *chart_.vis, nullptr); }
-    // A new style of the cycle, dashed when `dashes` is given.
-    GrxStyle& styleIn(GrxCycle& cycle, const XMLCh* dashes) {
+    // Adds a style to the cycle, dashed when `dashes` is given.
+    static GrxStyle& styleIn(GrxCycle& cycle, const XMLCh* dashes) {
         GrxStyle& style = cycle.addStyle();
         if (dashes != nullptr)
             style.setStroke_dasharray(dashes);
         return style;
     }
-    // Legend targets that name `id`.
-    int listed(const std::string& id) const {
+    // How many legend targets name the aesthetic.
+    int listed(const GrxBaseElement& aesthetic) const {
         int n = 0;
         for (const GrxLegendTarget* t : legend_->getLegendTargets())
-            n += utf8(t->GetAttribute(GrxUni::_target)) == id;
+            n += utf8(t->GetAttribute(GrxUni::_target)) == utf8(aesthetic.GetAttribute(GrxUni::_id));
         return n;
     }
-    static std::vector<std::string> dashes(const GrxStyleCycle* sc) {
-        std::vector<std::string> out;
+    // A style's attribute of every style of the cycle's first cycle, joined by '|'.
+    static std::string styles(const GrxStyleCycle* sc, const XMLCh* name) {
+        std::string out;
         for (const GrxStyle* s : sc->getCycles().at(0)->getStyles())
-            out.push_back(utf8(s->getStroke_dasharray()));
+            out += utf8(s->GetAttribute(name)) + "|";
         return out;
     }
 
@@ -69,68 +70,35 @@ protected:
     GrxStyleCycle* repository_ = nullptr;
 };
 
-TEST_F(Cloning, DuplicateAttributesCopiesAllButTheId) {
-    GrxStyle& onlyId = chart_.vis->addStyle();
-    onlyId.setId(u"onlyId");
-    GrxStyle& to = chart_.vis->addStyle();
-    to.setId(u"to");
-    to.setColor(u"red");
-    EXPECT_EQ(probe().duplicateAttributes(onlyId, to), 0u);
-    EXPECT_EQ(to.getImplementation()->getAttributes()->getLength(), 2u);
-
-    GrxStyle& from = chart_.vis->addStyle();
-    from.setId(u"from");
-    from.setColor(u"blue");
-    from.setSymbol(u"circle");
-    EXPECT_EQ(probe().duplicateAttributes(from, to), 2u);
-    EXPECT_EQ(utf8(to.getColor()) + " " + utf8(to.getSymbol()) + " " + utf8(to.getId()), "blue circle to");
-    EXPECT_EQ(chart_.vis->getElementById(u"from"), from.getImplementation());
-}
-
 TEST_F(Cloning, APointOntoALineTurnsShapesIntoDashesOfTheRepositoryDashCycle) {
     GrxCycle& dashCycle = repository_->addCycle();
     styleIn(dashCycle, u"none").setId(u"repositoryDash1");
-    styleIn(dashCycle, u"4 2").setStroke_width(u"2pt");
+    styleIn(dashCycle, u"4 2");
     GrxLine& line = graph_->addLine();
-    const std::size_t cyclesBefore = chart_.vis->getStyleCycles().size();
-
     EXPECT_TRUE(probe().cloneElementChildren(*point_, line, true));
 
     EXPECT_TRUE(line.getShapes().empty());
     ASSERT_EQ(line.getDashs().size(), 1u);
     const GrxDash& dash = *line.getDashs()[0];
-    EXPECT_TRUE(startsWith(utf8(dash.getId()), "shape") && utf8(dash.getId()) != "shape_1");
-    EXPECT_EQ(utf8(dash.GetAttribute(GrxUni::_variable)), "var_gender");
-    EXPECT_EQ(utf8(dash.GetAttribute(GrxUni::_domain)), "domain_gender");
-
-    // The dash cycles through a new style cycle holding copies of the repository's dash styles.
-    ASSERT_EQ(chart_.vis->getStyleCycles().size(), cyclesBefore + 1);
+    EXPECT_TRUE(fresh(dash.getId(), "shape", "shape_1"));
+    EXPECT_EQ(utf8(dash.GetAttribute(GrxUni::_variable)) + " " + utf8(dash.GetAttribute(GrxUni::_domain)),
+              "var_gender domain_gender");
+    // A new style cycle holding copies of the repository's dash styles, without their ids.
     const GrxStyleCycle* made = dash.getCycle();
     ASSERT_TRUE(made != nullptr && made != repository_);
-    EXPECT_TRUE(startsWith(utf8(made->getId()), "styleCycle"));
-    EXPECT_EQ(dashes(made), (std::vector<std::string>{"none", "4 2"}));
-    const std::vector<GrxStyle*> styles = made->getCycles()[0]->getStyles();
-    EXPECT_EQ(utf8(styles[1]->getStroke_width()), "2pt");
-    EXPECT_FALSE(styles[0]->isIdPresent());
+    EXPECT_EQ(styles(made, GrxUni::_stroke_dasharray) + styles(made, GrxUni::_id), "none|4 2|||");
 
     // The colour comes along; variables, coordinates and the dot setting follow the point.
     ASSERT_EQ(line.getColors().size(), 1u);
     const GrxColor& colour = *line.getColors()[0];
-    EXPECT_TRUE(startsWith(utf8(colour.getId()), "color") && utf8(colour.getId()) != "color_1");
+    EXPECT_TRUE(fresh(colour.getId(), "color", "color_1"));
     EXPECT_EQ(colour.getCycle(), repository_);
-    EXPECT_EQ(colour.getAffect(), 1);
     ASSERT_TRUE(line.getX() && line.getY());
-    EXPECT_EQ(utf8(line.getX()->GetAttribute(GrxUni::_variable)), "var_salbegin");
     EXPECT_EQ(utf8(line.getY()->GetAttribute(GrxUni::_variable)), "var_salary");
     EXPECT_EQ(line.getCoordinates(), point_->getCoordinates());
     EXPECT_TRUE(line.isDotPresent() && !line.getDot());
-
-    // Both new aesthetics are childless, so the legend lists them beside the old ones.
-    EXPECT_EQ(listed("color_1") + listed("shape_1"), 2);
-    EXPECT_EQ(listed(utf8(colour.getId())) + listed(utf8(dash.getId())), 2);
-    for (const GrxLegendTarget* t : legend_->getLegendTargets())
-        EXPECT_TRUE(startsWith(utf8(t->getId()), "legend")) << utf8(t->getId());
-    EXPECT_EQ(grammar_test::chartFaults(*chart_.vis), "");
+    // Both are childless, so the legend lists them beside the old ones.
+    EXPECT_EQ(listed(colour) + listed(dash) + listed(*point_->getColors()[0]), 3);
 }
 
 TEST_F(Cloning, TheLastDashCycleOfTheRepositoryIsTakenOrNone) {
@@ -148,42 +116,34 @@ TEST_F(Cloning, TheLastDashCycleOfTheRepositoryIsTakenOrNone) {
     ASSERT_EQ(path.getDashs().size(), 1u);
     EXPECT_FALSE(path.getDashs()[0]->isCyclePresent());
     EXPECT_EQ(chart_.vis->getStyleCycles().size(), cyclesBefore);
-    EXPECT_EQ(listed(utf8(path.getDashs()[0]->getId())), 0); // no legend flag
+    EXPECT_EQ(listed(*path.getDashs()[0]), 0); // no legend flag
 
-    styleIn(repository_->addCycle(), u"1 1");
     GrxCycle& second = repository_->addCycle();
-    styleIn(second, nullptr).setColor(u"red");
+    styleIn(second, nullptr);
     styleIn(second, u"9 9"); // its second style dashes: still a dash cycle
     styleIn(repository_->addCycle(), u"5 5").setSymbol(u"square");
     GrxLine& line = graph_->addLine();
     probe().cloneElementAesthetics(*point_, line, false);
     ASSERT_EQ(line.getDashs().size(), 1u);
     ASSERT_NE(line.getDashs()[0]->getCycle(), nullptr);
-    EXPECT_EQ(dashes(line.getDashs()[0]->getCycle()), (std::vector<std::string>{"", "9 9"}));
-    EXPECT_EQ(grammar_test::chartFaults(*chart_.vis), "");
+    EXPECT_EQ(styles(line.getDashs()[0]->getCycle(), GrxUni::_stroke_dasharray), "|9 9|");
 }
 
 TEST_F(Cloning, APointOntoAPointKeepsShapesMappingsScalesStatisticsAndStyledConditions) {
-    GrxSymbolMapping& mapping = point_->getShapes().at(0)->addSymbolMapping();
-    mapping.setFrom(u"Male");
-    mapping.setTo(u"square");
+    point_->getShapes().at(0)->addSymbolMapping().setTo(u"square");
     point_->getShapes()[0]->addScale(1).removeMethod(); // a scale that does not say its method
     GrxColor& colour = *point_->getColors()[0];
     colour.addScale(2).setInvert(true);
     colour.addColorMapping().setTo(u"red");
-    colour.addColorMapping().setFrom(u"Male");
-    colour.addDashMapping().setFrom(u"ignored");
     colour.addSummaryStatistic().setMethod(4);
     GrxStyle& style = chart_.vis->addStyle();
     style.setId(u"highlight");
     point_->addConditionalStyle(ChartString("x > 10"), style);
     point_->addConditionalStyle(ChartString("y > 5"), style).SetAttribute(GrxUni::_style, u"nowhere");
-    point_->setDot(true);
 
     GrxPoint& copy = graph_->addPoint();
     probe().cloneElementAesthetics(*point_, copy, true);
     EXPECT_TRUE(copy.getDashs().empty());
-    EXPECT_TRUE(copy.getDot());
     ASSERT_EQ(copy.getShapes().size(), 1u);
     const GrxShape& shape = *copy.getShapes()[0];
     EXPECT_EQ(shape.getCycle(), repository_);
@@ -192,52 +152,40 @@ TEST_F(Cloning, APointOntoAPointKeepsShapesMappingsScalesStatisticsAndStyledCond
     // The new scale starts as method 3; only what the old one says is copied over it.
     ASSERT_NE(shape.getScale(), nullptr);
     EXPECT_EQ(shape.getScale()->getMethod(), 3);
-
     const GrxColor& made = *copy.getColors().at(0);
     ASSERT_TRUE(made.getScale() && made.getSummaryStatistic());
-    EXPECT_EQ(made.getScale()->getMethod(), 2);
-    EXPECT_TRUE(made.getScale()->getInvert());
-    ASSERT_EQ(made.getColorMappings().size(), 2u);
-    EXPECT_EQ(utf8(made.getColorMappings()[0]->getTo()) + utf8(made.getColorMappings()[1]->getFrom()),
-              "redMale");
-    EXPECT_TRUE(made.getDashMappings().empty());
+    EXPECT_TRUE(made.getScale()->getMethod() == 2 && made.getScale()->getInvert());
+    ASSERT_EQ(made.getColorMappings().size(), 1u);
+    EXPECT_EQ(utf8(made.getColorMappings()[0]->getTo()), "red");
     EXPECT_EQ(made.getSummaryStatistic()->getMethod(), 4);
     // Aesthetics with children get no legend entry.
-    EXPECT_EQ(listed(utf8(shape.getId())) + listed(utf8(made.getId())), 0);
+    EXPECT_EQ(listed(shape) + listed(made), 0);
 
     // A condition whose style names nothing is skipped, and reported.
     EXPECT_FALSE(probe().cloneConditionalStyles(*point_, copy));
-    const std::vector<GrxConditionalStyle*> conditions = copy.getConditionalStyles();
-    ASSERT_EQ(conditions.size(), 1u);
-    EXPECT_EQ(utf8(conditions[0]->getWhen()), "x > 10");
-    EXPECT_EQ(conditions[0]->getStyle(), &style);
+    ASSERT_EQ(copy.getConditionalStyles().size(), 1u);
+    EXPECT_EQ(utf8(copy.getConditionalStyles()[0]->getWhen()), "x > 10");
+    EXPECT_EQ(copy.getConditionalStyles()[0]->getStyle(), &style);
 }
 
-TEST_F(Cloning, OntoALabelingOnlyStyleBysComponentsColoursAndSizesAndSizesGetTheElementDefaults) {
+TEST_F(Cloning, OntoALabelingOnlyStyleBysComponentsColoursAndSizesWithTheElementsDefaultSizes) {
     point_->addStyleBy().setVariable(*point_->getColors()[0]->getVariable());
     point_->addColorComponent().setType(1);
     point_->addDash();
     point_->addPattern();
     point_->addSize();
     point_->addRotation();
-    point_->addTransparency();
-    point_->addOffset();
     GrxLabeling& labeling = point_->addLabeling();
     const std::size_t before = labeling.getImplementation()->getChildElementCount();
     EXPECT_FALSE(probe().cloneElementAesthetics(*point_, labeling, false));
-
     EXPECT_EQ(labeling.getImplementation()->getChildElementCount(), before + 4);
-    EXPECT_EQ(labeling.getColors().size(), 1u);
-    ASSERT_EQ(labeling.getStyleBys().size(), 1u);
-    ASSERT_EQ(labeling.getColorComponents().size(), 1u);
+    ASSERT_EQ(labeling.getStyleBys().size() + labeling.getColorComponents().size() +
+                  labeling.getColors().size(),
+              3u);
     ASSERT_EQ(labeling.getSizes().size(), 1u);
     EXPECT_EQ(utf8(labeling.getSizes()[0]->getLow()) + "-" + utf8(labeling.getSizes()[0]->getHigh()),
               "6pt-18pt");
-    EXPECT_EQ(labeling.getColorComponents()[0]->getType(), 1);
-    EXPECT_TRUE(startsWith(utf8(labeling.getSizes()[0]->getId()), "length"));
-    EXPECT_TRUE(startsWith(utf8(labeling.getColorComponents()[0]->getId()), "colorComponent"));
-    EXPECT_TRUE(startsWith(utf8(labeling.getStyleBys()[0]->getId()), "styleBy"));
-    EXPECT_EQ(grammar_test::chartFaults(*chart_.vis), "");
+    EXPECT_TRUE(fresh(labeling.getSizes()[0]->getId(), "length", ""));
 
     // Onto an interval, a size without bounds gets the interval's; one with a bound keeps it alone.
     point_->addSize().setLow(u"1pt");
@@ -246,9 +194,7 @@ TEST_F(Cloning, OntoALabelingOnlyStyleBysComponentsColoursAndSizesAndSizesGetThe
     const std::vector<GrxSize*> sizes = interval.getSizes();
     ASSERT_EQ(sizes.size(), 2u);
     EXPECT_EQ(utf8(sizes[0]->getLow()) + "-" + utf8(sizes[0]->getHigh()), "0.25pt-3pt");
-    EXPECT_EQ(utf8(sizes[1]->getLow()), "1pt");
-    EXPECT_FALSE(sizes[1]->isHighPresent());
-    EXPECT_NE(utf8(sizes[0]->getId()), utf8(sizes[1]->getId()));
+    EXPECT_TRUE(utf8(sizes[1]->getLow()) == "1pt" && !sizes[1]->isHighPresent());
 }
 
 TEST_F(Cloning, StyleBysTakeTheirReferencesAndACopyOfTheirCycle) {
@@ -262,47 +208,35 @@ TEST_F(Cloning, StyleBysTakeTheirReferencesAndACopyOfTheirCycle) {
     probe().cloneElementAesthetics(*point_, line, true);
     ASSERT_EQ(line.getStyleBys().size(), 1u);
     const GrxStyleBy& made = *line.getStyleBys()[0];
-    EXPECT_TRUE(startsWith(utf8(made.getId()), "styleBy") && utf8(made.getId()) != "styleBy_gender");
+    EXPECT_TRUE(fresh(made.getId(), "styleBy", "styleBy_gender"));
     for (const XMLCh* name : {GrxUni::_dimension, GrxUni::_domain, GrxUni::_variable})
         EXPECT_EQ(utf8(made.GetAttribute(name)), utf8(styleBy.GetAttribute(name)));
-    const GrxStyleCycle* cycle = made.getCycle();
-    ASSERT_TRUE(cycle != nullptr && cycle != repository_);
-    ASSERT_EQ(cycle->getCycles().size(), 1u);
-    const std::vector<GrxStyle*> styles = cycle->getCycles()[0]->getStyles();
-    const std::vector<GrxStyle*> old = repository_->getCycles()[0]->getStyles();
-    ASSERT_EQ(styles.size(), old.size());
-    for (std::size_t i = 0; i < styles.size(); ++i) {
-        EXPECT_EQ(utf8(styles[i]->getColor()) + utf8(styles[i]->getSymbol()),
-                  utf8(old[i]->getColor()) + utf8(old[i]->getSymbol()));
-        EXPECT_FALSE(styles[i]->isIdPresent());
-    }
+    ASSERT_TRUE(made.getCycle() != nullptr && made.getCycle() != repository_);
+    EXPECT_EQ(styles(made.getCycle(), GrxUni::_color), styles(repository_, GrxUni::_color));
+    EXPECT_EQ(styles(made.getCycle(), GrxUni::_id).find_first_not_of('|'), std::string::npos);
     // A domain of another kind is not taken over.
     GrxStyleBy& other = point_->addStyleBy();
     other.SetAttribute(GrxUni::_domain, u"dim_x");
     GrxStyleBy& target = line.addStyleBy();
     probe().cloneStyleBy(other, target);
     EXPECT_FALSE(target.isDomainPresent() || target.isCyclePresent());
-    EXPECT_EQ(grammar_test::chartFaults(*chart_.vis), "");
 }
 
 TEST_F(Cloning, AStyleCycleOfTheElementKeepsOnlyColoursSwappedFromAPoint) {
     GrxStyleCycle& own = chart_.vis->addStyleCycle(ChartString("ownCycle"));
-    GrxCycle& cycle = own.addCycle();
-    GrxStyle& first = cycle.addStyle();
+    GrxStyle& first = own.addCycle().addStyle();
     first.setColor(u"red");
     first.setColor2(u"black");
     first.setSymbol(u"circle");
-    cycle.addStyle().setColor(u"blue"); // no colour 2
     GrxStyleBy& styleBy = point_->addStyleBy();
     styleBy.SetAttribute(GrxUni::_variable, u"var_gender");
     styleBy.setCycle(own);
-
     const struct {
         const char* from;
         const char* to;
-        bool swapped;
+        const char* colours;
     } cases[] = {
-        {"point", "text", true}, {"point", "line", true}, {"area", "line", false}, {"point", "area", false}};
+        {"point", "text", "black/red"}, {"point", "line", "black/red"}, {"area", "line", "red/black"}};
     for (const auto& c : cases) {
         SCOPED_TRACE(std::string(c.from) + " to " + c.to);
         GrxArea& to = graph_->addArea();
@@ -311,87 +245,63 @@ TEST_F(Cloning, AStyleCycleOfTheElementKeepsOnlyColoursSwappedFromAPoint) {
         const GrxStyleBy& made = *to.getStyleBys()[0];
         EXPECT_EQ(utf8(made.GetAttribute(GrxUni::_variable)), "var_gender");
         ASSERT_NE(made.getCycle(), nullptr);
-        EXPECT_TRUE(startsWith(utf8(made.getCycle()->getId()), "labelCycle"));
-        const std::vector<GrxStyle*> styles = made.getCycle()->getCycles().at(0)->getStyles();
-        ASSERT_EQ(styles.size(), 2u);
-        EXPECT_EQ(utf8(styles[0]->getColor()) + "/" + utf8(styles[0]->getColor2()),
-                  c.swapped ? "black/red" : "red/black");
-        EXPECT_EQ(styles[0]->getImplementation()->getAttributes()->getLength(), 2u); // no symbol
-        EXPECT_EQ(styles[1]->isColorPresent(), !c.swapped);
-        EXPECT_EQ(styles[1]->isColor2Present(), c.swapped);
+        EXPECT_TRUE(fresh(made.getCycle()->getId(), "labelCycle", ""));
+        const GrxStyle& style = *made.getCycle()->getCycles().at(0)->getStyles().at(0);
+        EXPECT_EQ(utf8(style.getColor()) + "/" + utf8(style.getColor2()), c.colours);
+        EXPECT_FALSE(style.isSymbolPresent());
     }
-    EXPECT_EQ(grammar_test::chartFaults(*chart_.vis), "");
-
-    // The new style-by's variable is a source or an expression variable only; a from without
-    // style-bys adds none.
+    // The new style-by's variable is a source or an expression variable only.
     GrxDerivedVariable& derived = chart_.vis->addDerivedVariable();
     derived.setId(u"derived1");
-    GrxExpressionVariable& expression = chart_.vis->addExpressionVariable();
-    expression.setId(u"expression1");
-    GrxArea& none = graph_->addArea();
-    probe().cloneStyleCycle(none, graph_->addPoint(), u"c", ChartString("point"), ChartString("line"));
-    EXPECT_TRUE(none.getStyleBys().empty());
     styleBy.removeCycle();
     styleBy.setVariable(derived);
     GrxArea& a = graph_->addArea();
     probe().cloneStyleCycle(a, *point_, u"c", ChartString("point"), ChartString("line"));
     ASSERT_EQ(a.getStyleBys().size(), 1u);
     EXPECT_FALSE(a.getStyleBys()[0]->isVariablePresent() || a.getStyleBys()[0]->isCyclePresent());
-    styleBy.setVariable(expression);
-    GrxArea& b = graph_->addArea();
-    probe().cloneStyleCycle(b, *point_, u"c", ChartString("point"), ChartString("line"));
-    EXPECT_EQ(b.getStyleBys().at(0)->getVariable(), &expression);
 }
 
 TEST_F(Cloning, ColourTwoReplacesColourWhereUnsetOrForcedAndColoursTurnMain) {
-    // A style cycle with one style per "colour/colour2" word; "-" leaves one out.
+    // One style per "colour/colour2" word; "-" leaves one out.
     const auto cycleOf = [&](const std::string& words) -> GrxStyleCycle& {
         GrxStyleCycle& sc = chart_.vis->addStyleCycle(probe().CreateUniqueId(ChartString("swap")));
         GrxCycle& cycle = sc.addCycle();
         std::istringstream in(words);
         for (std::string word; in >> word;) {
-            GrxStyle& s = cycle.addStyle();
+            GrxStyle& style = cycle.addStyle();
             const std::string colour = word.substr(0, word.find('/')),
                               colour2 = word.substr(word.find('/') + 1);
             if (colour != "-")
-                s.setColor(ChartString(colour).xc_str());
+                style.setColor(ChartString(colour).xc_str());
             if (colour2 != "-")
-                s.setColor2(ChartString(colour2).xc_str());
+                style.setColor2(ChartString(colour2).xc_str());
         }
         return sc;
     };
-    const auto colours = [](const GrxStyleCycle& sc) {
-        std::string out;
-        for (const GrxStyle* s : sc.getCycles()[0]->getStyles())
-            out += utf8(s->getColor()) + " ";
-        return out;
-    };
     // Without force explicit colours stay; colour 2 itself stays too.
-    GrxStyleCycle& sc = cycleOf("red/blue transparent/- -/green transparent/transparent -/-");
+    GrxStyleCycle& sc = cycleOf("red/blue transparent/- -/green -/-");
     GrxLine& line = graph_->addLine();
     line.addStyleBy().setCycle(sc);
     line.addStyleBy(); // without a cycle: counted, nothing to change
-    GrxColor& absent = line.addColor();
-    GrxColor& both = line.addColor();
-    both.setAffect(1);
-    GrxColor& secondary = line.addColor();
-    secondary.setAffect(3);
+    line.addColor();
+    line.addColor().setAffect(1);
+    line.addColor().setAffect(3);
     EXPECT_EQ(probe().changeColor2ToColor(line, false), 2u);
-    EXPECT_EQ(colours(sc), "red black green black black ");
-    EXPECT_EQ(utf8(sc.getCycles()[0]->getStyles()[0]->getColor2()), "blue");
-    EXPECT_EQ(absent.getAffect(), 2);
-    EXPECT_EQ(both.getAffect(), 1);
-    EXPECT_EQ(secondary.getAffect(), 2);
+    EXPECT_EQ(styles(&sc, GrxUni::_color) + styles(&sc, GrxUni::_color2),
+              "red|black|green|black|blue||green||");
+    std::string affects;
+    for (const GrxColor* colour : line.getColors())
+        affects += std::to_string(colour->getAffect());
+    EXPECT_EQ(affects, "212");
 
     // With force every style takes its colour 2; the element's own colour is not the labeling's.
     GrxStyleCycle& forced = cycleOf("red/blue white/- red/transparent");
     GrxLabeling& labeling = point_->addLabeling();
     labeling.addStyleBy().setCycle(forced);
-    GrxColor& colour = labeling.addColor();
-    colour.setAffect(0);
+    labeling.addColor().setAffect(0);
     EXPECT_EQ(probe().changeColor2ToColor(labeling, true), 1u);
-    EXPECT_EQ(colours(forced), "blue black black ");
-    EXPECT_EQ(colour.getAffect(), 2);
+    EXPECT_EQ(styles(&forced, GrxUni::_color), "blue|black|black|");
+    EXPECT_EQ(labeling.getColors()[0]->getAffect(), 2);
     EXPECT_EQ(point_->getColors()[0]->getAffect(), 1);
 }
 
@@ -400,10 +310,10 @@ TEST_F(Cloning, CloneLegendEntryAddsATargetPerMatchingTargetOfEveryLegend) {
     made.setId(probe().CreateUniqueId(ChartString("color")));
     GrxLegend& second = chart_.vis->addLegend();
     second.setId(u"legend_2");
-    second.addLegendTarget(*point_->getColors()[0]).setId(u"legend_2_target1");
-    second.addLegendTarget(*point_->getShapes()[0]).setId(u"legend_2_target2");
+    second.addLegendTarget(*point_->getShapes()[0]).setId(u"legend_2_target1");
+    second.addLegendTarget(*point_->getColors()[0]).setId(u"legend_2_target2");
     probe().CloneLegendEntry(ChartString("color_1"), made);
-    EXPECT_EQ(listed(utf8(made.getId())), 1);
+    EXPECT_EQ(listed(made), 1);
     ASSERT_EQ(second.getLegendTargets().size(), 3u);
     EXPECT_EQ(second.getLegendTargets()[2]->getTarget(), &made);
     // An empty old id matches nothing, not even targets without a reference.
@@ -411,39 +321,28 @@ TEST_F(Cloning, CloneLegendEntryAddsATargetPerMatchingTargetOfEveryLegend) {
     const std::size_t count = legend_->getLegendTargets().size();
     probe().CloneLegendEntry(ChartString(), made);
     EXPECT_EQ(legend_->getLegendTargets().size(), count);
-    legend_->getLegendTargets().back()->setId(u"untargeted");
-    EXPECT_EQ(grammar_test::chartFaults(*chart_.vis), "");
 }
 
-// Every element of every sample chart cloned onto a new line and a new point, legends and
-// labelings included: the ids stay unique and the chart stays valid for both validators.
+// Every element of every sample chart cloned onto a new line and a new point, labelings included:
+// the ids stay unique and the chart stays valid.
 TEST(ClonedSamples, StayValidWithUniqueIds) {
     plotaid::detail::XercesRuntime runtime;
-    const std::vector<std::string> charts = grammar_test::sampleCharts();
-    ASSERT_GE(charts.size(), 10u);
-    std::size_t labelings = 0;
-    for (const std::string& path : charts) {
+    for (const std::string& path : grammar_test::sampleCharts()) {
         Chart chart = Chart::parse(grammar_test::readText(path));
         ASSERT_TRUE(chart.vis) << path;
         Probe probe(nullptr, *chart.vis, nullptr);
-        std::size_t clones = 0;
         for (GrrUviza* graph : chart.vis->getGraphs()) {
             std::vector<CTElementType*> elements;
             BaseTemplate::getAllElements(*graph, elements);
             for (CTElementType* element : elements) {
                 probe.cloneElementChildren(*element, graph->addLine(), true);
                 probe.cloneElementChildren(*element, graph->addPoint(), true);
-                for (GrxLabeling* labeling : element->getLabelings()) {
+                for (GrxLabeling* labeling : element->getLabelings())
                     probe.cloneElementAesthetics(*element, *labeling, true);
-                    ++labelings;
-                }
-                clones += 2;
             }
         }
-        EXPECT_GT(clones, 0u) << path;
         EXPECT_EQ(grammar_test::chartFaults(*chart.vis), "") << path;
     }
-    EXPECT_GT(labelings, 0u);
 }
 
 } // namespace
