@@ -108,13 +108,8 @@ TEST_F(TextStyles, MissingFrameAndTickStylesAreMadeUnderFreshIds) {
         EXPECT_EQ(referred(chart, row.element.c_str(), row.reference.c_str()), row.made) << row.body;
     }
     // A slot naming neither a frame nor a legend is passed over.
-    for (const std::string& body :
-         {textStyle("labelFrame", "legend1"), textStyle("text", "legend1"), textStyle("labelFrame", "")})
+    for (const std::string& body : {textStyle("labelFrame", "legend1"), textStyle("labelFrame", "")})
         expectStyles(extension, body, "", "");
-    EXPECT_EQ(referred(expectStyles(axesChart("<majorTicks id=\"xt\" style=\"tick\"/>"),
-                                    textStyle("textFrame", "xaxis_labels"), ""),
-                       "xt", "style"),
-              "tick black");
 }
 
 // Two facet levels: the first with an axis of its own, the second with none.
@@ -142,7 +137,6 @@ TEST_F(TextStyles, PanelLabelsAndTitlesByLevel) {
     EXPECT_EQ(axesOfB(expectStyles(facetChart(), panel("text", "panel_labels", "1"), "ticksA:red axisA:black",
                                    "ticksA")),
               0u);
-    expectStyles(facetChart(), panel("text", "panel_labels", "2"), "ticksA:black", nullptr);
     expectStyles(facetChart(), panel("text", "panel_title", "1"), "titleA:red", "titleA");
     expectStyles(facetChart(), panel("text", "panel_title", "2"), "titleA:black", nullptr);
     // Only ticks that have a frame style take a frame.
