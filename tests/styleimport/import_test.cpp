@@ -116,13 +116,16 @@ const Row kRows[] = {
     // A style without a gradient colour removes the chart's one; the source's stays.
     {kBar, "barStyle", R"(<style value="color:red"/>)", "gradient-color=-", nullptr, kYellow},
     {kBar, "barStyle", R"(<style gradient-color="green"/>)", "gradient-color=yellow", kYellow, kYellow},
+    {kBar, "barStyle", R"(<style/>)", "gradient-color=yellow", kYellow, kYellow},
 
     // Under the source guard, what the chart's own definition sets stays.
     {kLine, "visualizationStyle",
      R"(<style value="color:red;fill:blue;stroke:green;font-size:20pt" padding="9pt"/>)",
      "color=white|color2=green|font-size=9pt|padding=3pt", kPlain},
-    // Stroke is guarded by the property it writes.
+    // Stroke and fill are guarded by the property they write; attribute-only properties too.
     {kLine, "tickLabelStyle", R"(<style value="stroke:red"/>)", "color=black", kPlain},
+    {kLine, "legendStyle", kNavyRedBlue, "color=white|color2=black", kPlain},
+    {kLine, "titleStyle", R"(<style textAlignment="right"/>)", "textAlignment=center", kPlain},
     // A source preferred size blocks the size, a source minimum the minimum.
     {kLine, "tickLabelStyle", R"(<style value="font-size:20pt;min-font-size:6pt"/>)", "font-size=8pt;6pt",
      kPlain},
