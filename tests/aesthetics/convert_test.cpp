@@ -1,8 +1,10 @@
 // "addDash" and "addImage": colour aesthetics turned into dash or image aesthetics that keep the
-// colour's variable, domain and id under a new cycle.
+// colour's variable, domain and id under a new cycle. Both share one conversion; the walk's test
+// shows "addImage" making images.
 #include "AestheticsSupport.h"
 
 using namespace aesthetics_test;
+using plotaid::detail::TAddDash;
 
 namespace {
 
@@ -14,46 +16,19 @@ const std::string kChart = chartWith(
     "<dash id='dash_own' variable='var_a'/><color id='colour_b' variable='var_b'/></line>",
     "<legend id='legend_1'><legendTarget id='target_a' target='colour_a'/>"
     "<legendTarget id='target_b' target='colour_b'/></legend>\n");
-const std::string kCycle = "<cycle><style stroke-dasharray='3 1'/></cycle>";
+const std::string kAddDash = "<addDash><cycle><style stroke-dasharray='3 1'/></cycle></addDash>";
 
-struct ToDash {
-    using Action = plotaid::detail::TAddDash;
-    using Aesthetic = GrxDash;
-    static constexpr const char* tag = "addDash";
-    static std::vector<GrxDash*> made(const GrxLine& line) { return line.getDashs(); }
-    static constexpr std::size_t before = 1; // the line's own dash
-};
-struct ToImage {
-    using Action = plotaid::detail::TAddImage;
-    using Aesthetic = GrxImage;
-    static constexpr const char* tag = "addImage";
-    static std::vector<GrxImage*> made(const GrxLine& line) { return line.getImages(); }
-    static constexpr std::size_t before = 0;
-};
+using AddDash = AestheticsTest;
 
-template <class Kind> class ConvertColours : public AestheticsTest {
-protected:
-    static bool apply(GrxVisualization& chart, const std::string& attributes, const std::string& body,
-                      const GrxVisualization* source = nullptr) {
-        const std::string tag = Kind::tag;
-        return applyAction<typename Kind::Action>(
-            "<" + tag + " " + attributes + ">" + body + "</" + tag + ">", chart, source);
-    }
-};
-using Kinds = ::testing::Types<ToDash, ToImage>;
-TYPED_TEST_SUITE(ConvertColours, Kinds);
-
-TYPED_TEST(ConvertColours, EveryColourBecomesTheNewAestheticUnderItsId) {
-    using A = typename TypeParam::Aesthetic;
-    GrxVisualization& chart = this->parse(kChart);
-    EXPECT_TRUE(this->apply(chart, "", kCycle));
-    EXPECT_TRUE(byId<GrxLine>(chart, "line_1")->getColors().empty());
-    const std::vector<A*> made = TypeParam::made(*byId<GrxLine>(chart, "line_1"));
-    ASSERT_EQ(made.size(), TypeParam::before + 2);
-    const A* a = byId<A>(chart, "colour_a");
-    EXPECT_EQ(made[TypeParam::before], a);
-    EXPECT_EQ(made[TypeParam::before + 1], byId<A>(chart, "colour_b"));
-
+TEST_F(AddDash, EveryColourBecomesADashUnderItsIdOnce) {
+    GrxVisualization& chart = parse(kChart);
+    EXPECT_TRUE(applyAction<TAddDash>(kAddDash, chart));
+    const GrxLine& line = *byId<GrxLine>(chart, "line_1");
+    EXPECT_TRUE(line.getColors().empty());
+    const std::vector<GrxDash*> dashes = line.getDashs();
+    ASSERT_EQ(dashes.size(), 3u);
+    EXPECT_EQ(text(dashes[1]->getId()) + " " + text(dashes[2]->getId()), "colour_a colour_b");
+    const GrxDash* a = dashes[1];
     // Everything but the affect comes with it.
     std::string kept;
     for (const char* name : {"variable", "domain", "missing", "dimension", "clamp", "split"})
@@ -67,21 +42,21 @@ TYPED_TEST(ConvertColours, EveryColourBecomesTheNewAestheticUnderItsId) {
 
     // Applied again it finds no colour left.
     const std::string once = chart.AsUTF8();
-    EXPECT_TRUE(this->apply(chart, "", kCycle));
+    EXPECT_TRUE(applyAction<TAddDash>(kAddDash, chart));
     EXPECT_EQ(chart.AsUTF8(), once);
 }
 
-TYPED_TEST(ConvertColours, AnAestheticNumberAndACycleSelectWhatIsConverted) {
-    GrxVisualization& chart = this->parse(kChart);
+TEST_F(AddDash, AnAestheticNumberAndACycleSelectWhatIsConverted) {
+    GrxVisualization& chart = parse(kChart);
     const std::string before = chart.AsUTF8();
-    EXPECT_TRUE(this->apply(chart, "", "<style stroke-dasharray='3 1'/>"));
+    EXPECT_TRUE(applyAction<TAddDash>("<addDash><style stroke-dasharray='3 1'/></addDash>", chart));
     EXPECT_EQ(chart.AsUTF8(), before);
-
-    EXPECT_TRUE(this->apply(chart, "aestheticNumber='2'", kCycle));
+    EXPECT_TRUE(applyAction<TAddDash>(
+        "<addDash aestheticNumber='2'><cycle><style stroke-dasharray='3 1'/></cycle></addDash>", chart));
     const std::vector<GrxColor*> left = byId<GrxLine>(chart, "line_1")->getColors();
     ASSERT_EQ(left.size(), 1u);
     EXPECT_EQ(text(left.front()->getId()), "colour_a");
-    EXPECT_NE(byId<typename TypeParam::Aesthetic>(chart, "colour_b"), nullptr);
+    EXPECT_NE(byId<GrxDash>(chart, "colour_b"), nullptr);
 }
 
 } // namespace
