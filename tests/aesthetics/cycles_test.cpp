@@ -27,7 +27,7 @@ const std::string kSeries = chartWith(
 
 using SetCycles = AestheticsTest;
 
-TEST_F(SetCycles, EachSelectedDashOrShapeGetsACycleOfItsOwn) {
+TEST_F(SetCycles, EachSelectedDashGetsACycleOfItsOwnAndOnlyADashCycleCounts) {
     GrxVisualization& chart = parse(kSeries);
     const std::size_t cyclesBefore = chart.getStyleCycles().size();
     EXPECT_TRUE(applyAction<TSetDash>(kSetDash, chart));
