@@ -1,6 +1,8 @@
 // The template action base: what every action works on and the look-ups they share.
 #include <plotaid/BaseTemplate.h>
 
+#include "templates/Graphs.h"
+
 #include <plotaid/ChartBase.h>
 
 #include <grx/GrxModel.h>
@@ -121,16 +123,11 @@ GrxStyle& BaseTemplate::addStyle(GrxBaseElement& element, const XMLCh* id) {
 std::uint32_t BaseTemplate::getGraphs(std::vector<GrrUviza*>& graphs) const {
     const unsigned wanted =
         instruction_ ? ChartString(instruction_->getAttribute(GrxUni::_graph)).convertToInteger() : 0;
-    const GrxBaseElement& root = target_;
-    DOMNodeList* nodes = root.getImplementation()->getElementsByTagName(GrxUni::_graph);
-    const XMLSize_t count = nodes->getLength();
-    for (XMLSize_t i = 0; i < count; ++i) {
-        if (wanted != 0 && wanted != i + 1)
-            continue;
-        if (auto* graph = GrxBaseElement::wrapperOf<GrrUviza>(nodes->item(i)))
-            graphs.push_back(graph);
-    }
-    return static_cast<std::uint32_t>(count);
+    const std::vector<GrrUviza*> all = plotaid::detail::allGraphs(target_);
+    for (std::size_t i = 0; i < all.size(); ++i)
+        if (wanted == 0 || wanted == i + 1)
+            graphs.push_back(all[i]);
+    return static_cast<std::uint32_t>(all.size());
 }
 
 std::vector<GrxLegend*> BaseTemplate::getLegends() const {
@@ -354,3 +351,31 @@ bool BaseTemplate::doesCoordinateMatch(const GrxBaseElement& element, const Char
     const long wanted = name.equals(_y2) ? 1 : 0;
     return coordinatesPosition(node) == wanted;
 }
+
+namespace plotaid::detail {
+
+namespace {
+
+void collectGraphs(const DOMElement* parent, std::vector<GrrUviza*>& graphs) {
+    for (const DOMElement* child = parent->getFirstElementChild(); child;
+         child = child->getNextElementSibling()) {
+        const XMLCh* name = child->getLocalName() ? child->getLocalName() : child->getNodeName();
+        if (XMLString::equals(name, GrxUni::_graph)) {
+            if (auto* graph = GrxBaseElement::wrapperOf<GrrUviza>(child))
+                graphs.push_back(graph);
+        } else if (XMLString::equals(name, GrxUni::_container)) {
+            collectGraphs(child, graphs);
+        }
+    }
+}
+
+} // namespace
+
+std::vector<GrrUviza*> allGraphs(const GrxVisualization& target) {
+    std::vector<GrrUviza*> graphs;
+    const GrxBaseElement& root = target;
+    collectGraphs(root.getImplementation(), graphs);
+    return graphs;
+}
+
+} // namespace plotaid::detail

@@ -2,6 +2,8 @@
 // titles, legends, axes and panels, each given the instruction's style declarations.
 #include "templates/actions/style.h"
 
+#include "templates/Graphs.h"
+
 #include <grx/GrxModel.h>
 #include <grx/GrxUni.h>
 
@@ -41,28 +43,6 @@ bool isExcluded(const CTElementType& element) {
     const ChartString id(element.getId());
     return std::any_of(std::begin(kExcludedIdWords), std::end(kExcludedIdWords),
                        [&](const XMLCh* word) { return id.ContainsString(word); });
-}
-
-// Every graph of the chart, inside containers too, in document order. Graphs sit only directly
-// below the root or a container, so those are all that is walked: a search of the whole document
-// would cost every "setStyle" a pass over every data element.
-void collectGraphs(const DOMElement* parent, std::vector<GrrUviza*>& graphs) {
-    for (const DOMElement* child = parent->getFirstElementChild(); child; child = child->getNextElementSibling()) {
-        const XMLCh* name = child->getLocalName() ? child->getLocalName() : child->getNodeName();
-        if (XMLString::equals(name, GrxUni::_graph)) {
-            if (auto* graph = GrxBaseElement::wrapperOf<GrrUviza>(child))
-                graphs.push_back(graph);
-        } else if (XMLString::equals(name, GrxUni::_container)) {
-            collectGraphs(child, graphs);
-        }
-    }
-}
-
-std::vector<GrrUviza*> allGraphs(const GrxVisualization& target) {
-    std::vector<GrrUviza*> graphs;
-    const GrxBaseElement& root = target;
-    collectGraphs(root.getImplementation(), graphs);
-    return graphs;
 }
 
 template <class T> std::vector<T*> allOfKind(const GrxVisualization& target, const XMLCh* name) {
