@@ -2,12 +2,11 @@
 #include "templates/InstructionWalk.h"
 
 #include "foundation/RecordSink.h"
-#include "templates/actions/Actions.h"
+#include "templates/Kit.h"
 
 #include <plotaid/ChartErrorHandler.h>
 #include <plotaid/ChartException.h>
 
-#include <grx/ChartPrinter.h>
 #include <grx/ChartString.h>
 
 #include <kovar/KovarGoToCaller.h>
@@ -16,8 +15,8 @@
 #include <xercesc/util/XMLException.hpp>
 #include <xercesc/util/XMLString.hpp>
 
+#include <cstring>
 #include <optional>
-#include <sstream>
 
 using namespace XERCES_CPP_NAMESPACE;
 
@@ -27,81 +26,81 @@ namespace {
 
 const char* const kFile = "backend/chartxml/plotaid/src/templates/applytemplate";
 
-// Tested in this order, first match wins; a null factory is a class not built yet.
-const InstructionEntry kInstructions[] = {
-    {u"setStyle", "TStyle", makeAction<TStyle>},
-    {u"addFrame", "TAddFrame", nullptr},
-    {u"addHistogramSummaryFrame", "TAddHistogramSummaryFrame", nullptr},
-    {u"addImage", "TAddImage", makeAction<TAddImage>},
-    {u"setColor", "TSetColor", makeAction<TSetColor>},
-    {u"setDash", "TSetDash", makeAction<TSetDash>},
-    {u"setPattern", "TSetPattern", makeAction<TSetPattern>},
-    {u"setShape", "TSetShape", makeAction<TSetShape>},
-    {u"setSize", "TSetSize", makeAction<TSetSize>},
-    {u"setStyleCycle", "TStyleCycle", nullptr},
-    {u"setAxisScale", "TSetAxisScale", nullptr},
-    {u"setAxisInterval", "TSetAxisInterval", nullptr},
-    {u"setAxisMargin", "TSetAxisMargin", nullptr},
-    {u"setAxisStyle", "TSetAxisStyle", nullptr},
-    {u"setAxisMajorTicks", "TSetAxisMajorTicks", nullptr},
-    {u"setAxisMinorTicks", "TSetAxisMinorTicks", nullptr},
-    {u"setBackPlane", "TSetBackPlane", nullptr},
-    {u"setWireFrame", "TSetWireFrame", nullptr},
-    {u"addReferenceLine", "TReferenceLine", nullptr},
-    {u"addReferenceRectangle", "TReferenceRectangle", nullptr},
-    {u"addAnchoredAnnotation", "TAnchoredAnnotation", nullptr},
-    {u"addFitLine", "TFitLine", nullptr},
-    {u"addHistogramNormalLine", "THistogramNormalLine", nullptr},
-    {u"addInterpolationLine", "TInterpolationLine", nullptr},
-    {u"setWrapPanels", "TSetWrapPanels", nullptr},
-    {u"setAxisOpposite", "TSetAxisOpposite", nullptr},
-    {u"addDerivedAxis", "TAddDerivedAxis", nullptr},
-    {u"addOriginLine", "TAddOriginLine", nullptr},
-    {u"addBarEffects", "TAddBarEffects", nullptr},
-    {u"addPieEffects", "TAddPieEffects", nullptr},
-    {u"addPopups", "TAddPopups", nullptr},
-    {u"addDrillDown", "TAddDrilldowns", nullptr},
-    {u"addShadow", "TShadowEffects", nullptr},
-    {u"addDash", "TAddDash", makeAction<TAddDash>},
-    {u"addDataLabels", "TAddDataLabels", nullptr},
-    {u"setScaleByFraction", "TSetScaleByFraction", nullptr},
-    {u"setTranspose", "TSetTranspose", nullptr},
-    {u"setPieTranspose", "TSetPieTranspose", nullptr},
-    {u"setPanelOptions", "TSetPanelOptions", nullptr},
-    {u"setRotation", "TSetRotation", nullptr},
-    {u"setTickLabelFormat", "TSetTickLabelFormat", nullptr},
-    {u"setCategorySorting", "TSetCategorySorting", nullptr},
-    {u"setCollapse", "TSetCollapse", nullptr},
-    {u"setClusterWidth", "TSetClusterWidth", nullptr},
-    {u"setExclude", "TSetExclude", nullptr},
-    {u"setOrder", "TSetOrder", nullptr},
-    {u"setExplodeSlice", "TSetExplodeSlice", nullptr},
-    {u"setProjectionLine", "TSetProjectionLine", nullptr},
-    {u"setTickLabelAngle", "TSetTickLabelAngle", nullptr},
-    {u"addSpikes", "TAddSpikes", nullptr},
-    {u"addStyleCycle", "TAddStyleCycle", nullptr},
-    {u"setTickLabelFrequency", "TSetTickLabelFrequency", nullptr},
-    {u"setHistogramBinning", "THistogramBinning", nullptr},
-    {u"setScatterplotBinning", "TSetScatterplotBinning", nullptr},
-    {u"hideFrame", "THideFrame", nullptr},
-    {u"setShowLineMarkers", "TSetShowLineMarkers", makeAction<TSetShowLineMarkers>},
-    {u"setErrorBarOptions", "TSetErrorBarOptions", nullptr},
-    {u"addChartsOnDiagonal", "TAddChartsOnDiagonal", nullptr},
-    {u"setGenericAttributes", "TSetGenericAttributes", makeAction<TSetGenericAttributes>},
+// Tested in this order, first match wins. The factories come from the families' own rows.
+struct InstructionName {
+    const XMLCh* tag;
+    const char* actionClass;
 };
+
+const InstructionName kInstructions[] = {
+    {u"setStyle", "TStyle"},
+    {u"addFrame", "TAddFrame"},
+    {u"addHistogramSummaryFrame", "TAddHistogramSummaryFrame"},
+    {u"addImage", "TAddImage"},
+    {u"setColor", "TSetColor"},
+    {u"setDash", "TSetDash"},
+    {u"setPattern", "TSetPattern"},
+    {u"setShape", "TSetShape"},
+    {u"setSize", "TSetSize"},
+    {u"setStyleCycle", "TStyleCycle"},
+    {u"setAxisScale", "TSetAxisScale"},
+    {u"setAxisInterval", "TSetAxisInterval"},
+    {u"setAxisMargin", "TSetAxisMargin"},
+    {u"setAxisStyle", "TSetAxisStyle"},
+    {u"setAxisMajorTicks", "TSetAxisMajorTicks"},
+    {u"setAxisMinorTicks", "TSetAxisMinorTicks"},
+    {u"setBackPlane", "TSetBackPlane"},
+    {u"setWireFrame", "TSetWireFrame"},
+    {u"addReferenceLine", "TReferenceLine"},
+    {u"addReferenceRectangle", "TReferenceRectangle"},
+    {u"addAnchoredAnnotation", "TAnchoredAnnotation"},
+    {u"addFitLine", "TFitLine"},
+    {u"addHistogramNormalLine", "THistogramNormalLine"},
+    {u"addInterpolationLine", "TInterpolationLine"},
+    {u"setWrapPanels", "TSetWrapPanels"},
+    {u"setAxisOpposite", "TSetAxisOpposite"},
+    {u"addDerivedAxis", "TAddDerivedAxis"},
+    {u"addOriginLine", "TAddOriginLine"},
+    {u"addBarEffects", "TAddBarEffects"},
+    {u"addPieEffects", "TAddPieEffects"},
+    {u"addPopups", "TAddPopups"},
+    {u"addDrillDown", "TAddDrilldowns"},
+    {u"addShadow", "TShadowEffects"},
+    {u"addDash", "TAddDash"},
+    {u"addDataLabels", "TAddDataLabels"},
+    {u"setScaleByFraction", "TSetScaleByFraction"},
+    {u"setTranspose", "TSetTranspose"},
+    {u"setPieTranspose", "TSetPieTranspose"},
+    {u"setPanelOptions", "TSetPanelOptions"},
+    {u"setRotation", "TSetRotation"},
+    {u"setTickLabelFormat", "TSetTickLabelFormat"},
+    {u"setCategorySorting", "TSetCategorySorting"},
+    {u"setCollapse", "TSetCollapse"},
+    {u"setClusterWidth", "TSetClusterWidth"},
+    {u"setExclude", "TSetExclude"},
+    {u"setOrder", "TSetOrder"},
+    {u"setExplodeSlice", "TSetExplodeSlice"},
+    {u"setProjectionLine", "TSetProjectionLine"},
+    {u"setTickLabelAngle", "TSetTickLabelAngle"},
+    {u"addSpikes", "TAddSpikes"},
+    {u"addStyleCycle", "TAddStyleCycle"},
+    {u"setTickLabelFrequency", "TSetTickLabelFrequency"},
+    {u"setHistogramBinning", "THistogramBinning"},
+    {u"setScatterplotBinning", "TSetScatterplotBinning"},
+    {u"hideFrame", "THideFrame"},
+    {u"setShowLineMarkers", "TSetShowLineMarkers"},
+    {u"setErrorBarOptions", "TSetErrorBarOptions"},
+    {u"addChartsOnDiagonal", "TAddChartsOnDiagonal"},
+    {u"setGenericAttributes", "TSetGenericAttributes"},
+};
+
+std::vector<InstructionEntry>& registry() {
+    static std::vector<InstructionEntry> rows;
+    return rows;
+}
 
 thread_local WalkReport* currentReport = nullptr;
 thread_local ScopedInstructionTable* currentTable = nullptr;
-
-std::string printed(const DOMNode* node) {
-    try {
-        std::ostringstream out;
-        ChartPrinter().Print(node, out);
-        return out.str();
-    } catch (...) {
-        return ChartString(node->getNodeName()).toUTF8();
-    }
-}
 
 const InstructionEntry* find(const InstructionTable& table, const XMLCh* tag) {
     for (std::size_t i = 0; i < table.count; ++i)
@@ -119,8 +118,28 @@ std::string firstError(const RecordCollector& records) {
 
 } // namespace
 
+ActionFamily::ActionFamily(std::initializer_list<InstructionEntry> rows) {
+    registry().insert(registry().end(), rows.begin(), rows.end());
+}
+
+const std::vector<InstructionEntry>& registeredActions() noexcept {
+    return registry();
+}
+
 InstructionTable instructionTable() noexcept {
-    return {kInstructions, sizeof kInstructions / sizeof kInstructions[0]};
+    // Joined once, after every family registered itself during static initialisation.
+    static const std::vector<InstructionEntry> joined = [] {
+        std::vector<InstructionEntry> table;
+        for (const InstructionName& name : kInstructions) {
+            InstructionEntry entry{name.tag, name.actionClass, nullptr};
+            for (const InstructionEntry& row : registry())
+                if (XMLString::equals(row.tag, name.tag) && std::strcmp(row.actionClass, name.actionClass) == 0)
+                    entry.make = row.make;
+            table.push_back(entry);
+        }
+        return table;
+    }();
+    return {joined.data(), joined.size()};
 }
 
 ScopedInstructionTable::ScopedInstructionTable(InstructionTable table) noexcept

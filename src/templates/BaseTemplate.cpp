@@ -1,7 +1,7 @@
 // The template action base: what every action works on and the look-ups they share.
 #include <plotaid/BaseTemplate.h>
 
-#include "templates/Graphs.h"
+#include "templates/Kit.h"
 
 #include <plotaid/ChartBase.h>
 
@@ -39,15 +39,11 @@ const XMLCh* const BaseTemplate::_textFrame = u"textFrame";
 const XMLCh* const BaseTemplate::_tickLabelStyle = u"tickLabelStyle";
 const XMLCh* const BaseTemplate::_when = u"facet1==facet2";
 const XMLCh* const BaseTemplate::_xaxis_title = u"xaxis_title";
-const XMLCh* const BaseTemplate::_y2 = u"y2";
+const XMLCh* const BaseTemplate::_y2 = GrxUni::_y2;
 const XMLCh* const BaseTemplate::_yaxis_title = u"yaxis_title";
 const XMLCh* const BaseTemplate::_zaxis_title = u"zaxis_title";
 
 namespace {
-
-template <class T> void appendAll(std::vector<CTElementType*>& out, const std::vector<T*>& in) {
-    out.insert(out.end(), in.begin(), in.end());
-}
 
 template <class T> void appendAesthetics(std::vector<CTAesthetic*>& out, const std::vector<T*>& in) {
     out.insert(out.end(), in.begin(), in.end());
@@ -121,44 +117,23 @@ GrxStyle& BaseTemplate::addStyle(GrxBaseElement& element, const XMLCh* id) {
 }
 
 std::uint32_t BaseTemplate::getGraphs(std::vector<GrrUviza*>& graphs) const {
-    const unsigned wanted =
-        instruction_ ? ChartString(instruction_->getAttribute(GrxUni::_graph)).convertToInteger() : 0;
-    const std::vector<GrrUviza*> all = plotaid::detail::allGraphs(target_);
-    for (std::size_t i = 0; i < all.size(); ++i)
-        if (wanted == 0 || wanted == i + 1)
-            graphs.push_back(all[i]);
-    return static_cast<std::uint32_t>(all.size());
+    const std::vector<GrrUviza*> selected = plotaid::detail::selectedGraphs(target_, instruction_);
+    graphs.insert(graphs.end(), selected.begin(), selected.end());
+    return static_cast<std::uint32_t>(plotaid::detail::allGraphs(target_).size());
 }
 
 std::vector<GrxLegend*> BaseTemplate::getLegends() const {
-    std::vector<GrxLegend*> legends;
-    const GrxBaseElement& root = target_;
-    DOMNodeList* nodes = root.getImplementation()->getElementsByTagName(GrxUni::_legend);
-    for (XMLSize_t i = 0, count = nodes->getLength(); i < count; ++i)
-        if (auto* legend = GrxBaseElement::wrapperOf<GrxLegend>(nodes->item(i)))
-            legends.push_back(legend);
-    return legends;
+    return plotaid::detail::allOfKind<GrxLegend>(target_, GrxUni::_legend);
 }
 
 void BaseTemplate::getAllElements(const GrrUviza& graph, std::vector<CTElementType*>& elements) {
-    appendAll(elements, graph.getPoints());
-    appendAll(elements, graph.getLines());
-    appendAll(elements, graph.getEdges());
-    appendAll(elements, graph.getPaths());
-    appendAll(elements, graph.getIntervals());
-    appendAll(elements, graph.getAreas());
-    appendAll(elements, graph.getPolygons());
-    appendAll(elements, graph.getSchemas());
+    const std::vector<CTElementType*> own = plotaid::detail::elementsOf(graph);
+    elements.insert(elements.end(), own.begin(), own.end());
 }
 
 void BaseTemplate::getAllElementsByType(const XMLCh* name, std::vector<CTElementType*>& elements) const {
-    if (name == nullptr || *name == 0)
-        return;
-    const GrxBaseElement& root = target_;
-    DOMNodeList* nodes = root.getImplementation()->getOwnerDocument()->getElementsByTagName(name);
-    for (XMLSize_t i = 0, count = nodes->getLength(); i < count; ++i)
-        if (auto* element = GrxBaseElement::wrapperOf<CTElementType>(nodes->item(i)))
-            elements.push_back(element);
+    const std::vector<CTElementType*> found = plotaid::detail::allOfKind<CTElementType>(target_, name);
+    elements.insert(elements.end(), found.begin(), found.end());
 }
 
 std::vector<CTElementType*> BaseTemplate::getElementsWithSummaryStatistics(const GrrUviza& graph) const {
@@ -321,14 +296,7 @@ bool BaseTemplate::isAxisDerived(const GrxAxis& axis) const {
 }
 
 bool BaseTemplate::getBooleanAttribute(const DOMElement* element, const XMLCh* name, bool absent) {
-    if (element == nullptr || name == nullptr || *name == 0)
-        return absent;
-    const XMLCh* value = element->getAttribute(name);
-    if (XMLString::equals(value, GrxUni::_true))
-        return true;
-    if (XMLString::equals(value, GrxUni::_false))
-        return false;
-    return absent;
+    return plotaid::detail::booleanAttribute(element, name, absent);
 }
 
 bool BaseTemplate::doesCoordinateMatch(const CTElementType& element, const ChartString& number) const {
@@ -351,31 +319,3 @@ bool BaseTemplate::doesCoordinateMatch(const GrxBaseElement& element, const Char
     const long wanted = name.equals(_y2) ? 1 : 0;
     return coordinatesPosition(node) == wanted;
 }
-
-namespace plotaid::detail {
-
-namespace {
-
-void collectGraphs(const DOMElement* parent, std::vector<GrrUviza*>& graphs) {
-    for (const DOMElement* child = parent->getFirstElementChild(); child;
-         child = child->getNextElementSibling()) {
-        const XMLCh* name = child->getLocalName() ? child->getLocalName() : child->getNodeName();
-        if (XMLString::equals(name, GrxUni::_graph)) {
-            if (auto* graph = GrxBaseElement::wrapperOf<GrrUviza>(child))
-                graphs.push_back(graph);
-        } else if (XMLString::equals(name, GrxUni::_container)) {
-            collectGraphs(child, graphs);
-        }
-    }
-}
-
-} // namespace
-
-std::vector<GrrUviza*> allGraphs(const GrxVisualization& target) {
-    std::vector<GrrUviza*> graphs;
-    const GrxBaseElement& root = target;
-    collectGraphs(root.getImplementation(), graphs);
-    return graphs;
-}
-
-} // namespace plotaid::detail

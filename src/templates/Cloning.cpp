@@ -1,7 +1,7 @@
 // Copying one object of the target into another: a point redrawn as a line, a second element over
 // the first, a labeling that follows its element. Every aesthetic copied gets a fresh id, so ids
 // stay unique in the document and legends can list the copy beside the original.
-#include <plotaid/BaseTemplate.h>
+#include "templates/Kit.h"
 
 #include <plotaid/ChartBase.h>
 
@@ -15,9 +15,7 @@ using namespace XERCES_CPP_NAMESPACE;
 
 namespace {
 
-bool hasText(const XMLCh* text) {
-    return text != nullptr && *text != 0;
-}
+using plotaid::detail::hasText;
 
 bool isTransparentOrEmpty(const XMLCh* colour) {
     return !hasText(colour) || XMLString::equals(colour, GrxStyle::_transparent);

@@ -1,6 +1,6 @@
 // Template format elements carried over to the object model's formats. "format" replaces what the
 // format says; the other four only add to it, so a template can adjust a chart's own format.
-#include <plotaid/BaseTemplate.h>
+#include "templates/Kit.h"
 
 #include <grx/GrxModel.h>
 #include <grx/GrxUni.h>
@@ -12,20 +12,11 @@ using namespace XERCES_CPP_NAMESPACE;
 
 namespace {
 
-bool hasText(const XMLCh* text) {
-    return text != nullptr && *text != 0;
-}
+using plotaid::detail::hasText;
+using plotaid::detail::named;
 
 bool is(const XMLCh* value, const XMLCh* word) {
     return XMLString::equals(value, word);
-}
-
-// Template elements are matched by local name, whatever prefix the template gives them.
-bool named(const DOMNode* node, const XMLCh* name) {
-    if (node->getNodeType() != DOMNode::ELEMENT_NODE)
-        return false;
-    const XMLCh* local = node->getLocalName();
-    return XMLString::equals(local ? local : node->getNodeName(), name);
 }
 
 // Descendants of `root` with that name, in document order.

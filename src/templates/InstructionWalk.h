@@ -6,6 +6,7 @@
 #include <xercesc/util/XercesDefs.hpp>
 
 #include <cstddef>
+#include <initializer_list>
 #include <memory>
 #include <string>
 #include <vector>
@@ -40,8 +41,20 @@ struct InstructionTable {
     std::size_t count;
 };
 
-// The 59 instruction tags, in the order the walk tests them.
+// The 59 instruction tags, in the order the walk tests them, each with the factory its family
+// registered (null while no family carries the tag out).
 InstructionTable instructionTable() noexcept;
+
+// A family's rows of the walk's table. Each family source holds one at namespace scope, so adding
+// a family touches only its own files; a row whose tag and class name are not one of the 59 pairs
+// is never dispatched.
+class ActionFamily {
+public:
+    ActionFamily(std::initializer_list<InstructionEntry> rows);
+};
+
+// Every row the families registered, in registration order.
+const std::vector<InstructionEntry>& registeredActions() noexcept;
 
 // While one lives, walks on this thread use `table` instead of the 59 tags (for trying actions
 // out, and for tests of the walk's failure handling).

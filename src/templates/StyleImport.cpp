@@ -1,7 +1,8 @@
 // Template styles: the CSS-like style text (ChartStyleValue) and how a template "style" element is
 // merged into a style of the chart (BaseTemplate::importStyle). Everything about importing a style
 // is in this one file.
-#include <plotaid/BaseTemplate.h>
+#include "templates/Kit.h"
+#include <plotaid/ChartBase.h>
 #include <plotaid/ChartErrorHandler.h>
 #include <plotaid/ChartException.h>
 #include <plotaid/ChartStyleValue.h>
@@ -147,13 +148,6 @@ ChartString ChartStyleValue::getValue() const {
 namespace {
 
 const char kFile[] = "backend/chartxml/plotaid/src/templates/basetemplate";
-const XMLCh kContainerId[] = u"c-o-n-t-a-i-n-er";
-const XMLCh kPointPosition[] = u"pointPosition";
-const XMLCh kHidden[] = u"hidden";
-
-bool isEmpty(const XMLCh* text) {
-    return text == nullptr || *text == 0;
-}
 
 // The CSS-like value when there is one, else the attribute's.
 ChartString eitherValue(const ChartString& css, const XMLCh* attribute) {
@@ -165,17 +159,7 @@ const XMLCh* nameOf(const DOMNode* node) {
     return local ? local : node->getNodeName();
 }
 
-std::string printed(const DOMNode* node) {
-    try {
-        std::ostringstream out;
-        ChartPrinter printer;
-        printer.setPrintWhiteSpace(false);
-        printer.Print(node, out);
-        return out.str();
-    } catch (...) {
-        return std::string();
-    }
-}
+using plotaid::detail::printed;
 
 // The style of the chart's own definition that carries the target style's id, if any: whatever it
 // sets explicitly, the template leaves alone.
@@ -220,7 +204,7 @@ template <class Write>
 void mergeProperty(GrxStyle& style, const DOMElement& element, const ChartString& css, const XMLCh* name,
                    bool guarded, Write write) {
     const XMLCh* attribute = element.getAttribute(name);
-    if ((css.empty() && isEmpty(attribute)) || guarded)
+    if ((css.empty() && !plotaid::detail::hasText(attribute)) || guarded)
         return;
     if (!css.empty())
         write(css);
@@ -261,7 +245,7 @@ public:
         : action_(action), source_(source), styleId_(style.getId()), type_(child.getAttribute(GrxUni::_type)),
           missing_(child.getAttribute(GrxUni::_missingRepresentation)) {
         if (type_.equals(GrxUni::_step) || type_.equals(GrxUni::_jump)) {
-            const ChartString position(child.getAttribute(kPointPosition));
+            const ChartString position(child.getAttribute(GrxUni::_pointPosition));
             method_ = position.equals(GrxUni::_left) ? 13 : position.equals(GrxUni::_right) ? 14 : 15;
         }
     }
@@ -282,7 +266,7 @@ private:
                 own = &action_.addStyle(*element, nullptr);
                 element->setStyle(*own);
             }
-            const bool matching = styleId_.equals(kContainerId) || styleId_.equals(own->getId());
+            const bool matching = styleId_.equals(ChartBase::_container) || styleId_.equals(own->getId());
             if (matching && sourceSetsNoBreak<Kind>(*element)) {
                 if (missing_.equals(GrxUni::_gap))
                     element->setBreakRepresentation(1);
@@ -417,7 +401,7 @@ void BaseTemplate::importStyle(const DOMElement* element, GrxStyle& style) {
                   [&](const ChartString& v) { style.setMargin(v); });
     mergeProperty(
         style, e, css.getVisibility(), GrxUni::_visible, source.has(&GrxStyle::isVisiblePresent),
-        [&](const ChartString& v) { style.setVisible(!(v.equals(kHidden) || v.equals(GrxUni::_false))); });
+        [&](const ChartString& v) { style.setVisible(!(v.equals(GrxUni::_hidden) || v.equals(GrxUni::_false))); });
     mergeProperty(style, e, css.getMax_Width(), GrxUni::_width, source.hasWidthOrSize(true),
                   [&](const ChartString& v) { style.setWidth(nullptr, nullptr, v.xc_str()); });
     mergeProperty(style, e, css.getWidth(), GrxUni::_width, source.hasWidthOrSize(false),

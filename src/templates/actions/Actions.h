@@ -1,15 +1,16 @@
 #ifndef PLOTAID_TEMPLATES_ACTIONS_ACTIONS_H
 #define PLOTAID_TEMPLATES_ACTIONS_ACTIONS_H
 
-// The action families, one source per family (style, frames, annotations, axes, datalabels,
-// fitlines, aesthetics, categories, effects, interactivity, stylecycles). A family declares its
-// classes in its own header here and includes it below; each class then takes its place in the
-// walk's table (src/templates/ApplyTemplate.cpp) by replacing the null factory of its tag with
-// makeAction<TClass>, one line per class.
+// What an action family builds on. A family is one header declaring its action classes and one
+// source defining them, with one `ActionFamily` at namespace scope that lists its rows:
+//
+//     const ActionFamily family{{u"setDash", "TSetDash", makeAction<TSetDash>}, ...};
+//
+// An action is a plain BaseTemplate: it reads its instruction while it is made (its members are
+// initialised from `instruction_`) and `apply` carries it out.
 
 #include "templates/InstructionWalk.h"
-#include "templates/actions/aesthetics.h"
-#include "templates/actions/style.h"
+#include "templates/Kit.h"
 
 #include <memory>
 #include <type_traits>

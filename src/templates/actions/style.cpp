@@ -2,8 +2,6 @@
 // titles, legends, axes and panels, each given the instruction's style declarations.
 #include "templates/actions/style.h"
 
-#include "templates/Graphs.h"
-
 #include <grx/GrxModel.h>
 #include <grx/GrxUni.h>
 
@@ -19,12 +17,7 @@ namespace plotaid::detail {
 
 namespace {
 
-constexpr XMLCh kType[] = u"type";
-constexpr XMLCh kSubtype[] = u"subtype";
-constexpr XMLCh kTextFrame[] = u"textFrame";
 constexpr XMLCh kThreeD[] = u"3D";
-constexpr XMLCh kClustered[] = u"clustered";
-constexpr XMLCh kTickFrameStyle[] = u"tickFrameStyle";
 constexpr XMLCh kFull[] = u"100%";
 
 // Elements with these words in their id belong to special charts (series, control, survival,
@@ -32,27 +25,13 @@ constexpr XMLCh kFull[] = u"100%";
 constexpr const XMLCh* kExcludedIdWords[] = {u"AIM",  u"biplot", u"centroid", u"control",
                                              u"uide", u"series", u"survival", u"triplot"};
 
-constexpr const XMLCh* kIntervalTypes[] = {GrxUni::_bar, GrxUni::_range, u"histogram", u"population",
-                                           u"errorbar",  u"pie",         u"dropline"};
-
-bool same(const XMLCh* a, const XMLCh* b) {
-    return XMLString::equals(a, b);
-}
+const XMLCh* const kIntervalTypes[] = {GrxUni::_bar, GrxUni::_range, GrxUni::_histogram, GrxUni::_population,
+                                       BaseTemplate::_errorbar, BaseTemplate::_pie, BaseTemplate::_dropline};
 
 bool isExcluded(const CTElementType& element) {
     const ChartString id(element.getId());
     return std::any_of(std::begin(kExcludedIdWords), std::end(kExcludedIdWords),
                        [&](const XMLCh* word) { return id.ContainsString(word); });
-}
-
-template <class T> std::vector<T*> allOfKind(const GrxVisualization& target, const XMLCh* name) {
-    std::vector<T*> found;
-    const GrxBaseElement& root = target;
-    DOMNodeList* nodes = root.getImplementation()->getOwnerDocument()->getElementsByTagName(name);
-    for (XMLSize_t i = 0, count = nodes->getLength(); i < count; ++i)
-        if (auto* wrapper = GrxBaseElement::wrapperOf<T>(nodes->item(i)))
-            found.push_back(wrapper);
-    return found;
 }
 
 // The object of the chart whose id an extension slot attribute holds, for any extension.
@@ -65,23 +44,28 @@ template <class T> T* slotObject(const GrxExtensionVis& extension, const ChartSt
     return GrxBaseElement::wrapperOf<T>(extension.getElementById(id));
 }
 
-// The style `get` reads from `owner`, or a new one under `id` that `set` attaches.
-template <class Owner>
-GrxStyle& styleOf(BaseTemplate& action, Owner& owner, GrxStyle* (Owner::*get)() const,
-                  void (Owner::*set)(GrxStyle&), const ChartString& id) {
-    if (GrxStyle* existing = (owner.*get)())
-        return *existing;
-    GrxStyle& made = action.addStyle(owner, id.empty() ? nullptr : id.xc_str());
-    (owner.*set)(made);
-    return made;
-}
-
 } // namespace
 
 TStyle::TStyle(const GrxVisualization* source, GrxVisualization& target, const DOMElement* instruction)
-    : BaseTemplate(source, target, instruction) {}
-
-TStyle::~TStyle() = default;
+    : BaseTemplate(source, target, instruction) {
+    if (instruction_ == nullptr)
+        return;
+    // Numbers past the last graph name nothing, so the list never grows beyond the graph count.
+    const std::vector<GrrUviza*> graphs = allGraphs(target_);
+    const std::uint64_t kept = std::max<std::uint64_t>(graphs.size(), 1);
+    DOMNodeList* styles = instruction_->getElementsByTagName(GrxUni::_style);
+    for (XMLSize_t i = 0, count = styles->getLength(); i < count; ++i) {
+        auto* declaration = static_cast<DOMElement*>(styles->item(i));
+        const std::uint64_t number =
+            ChartString(declaration->getAttribute(GrxUni::_number)).convertToInteger();
+        extent_ = std::max(extent_, number + 1);
+        if (number >= kept)
+            continue;
+        if (declarations_.size() <= number)
+            declarations_.resize(number + 1, nullptr);
+        declarations_[number] = declaration;
+    }
+}
 
 DOMElement* TStyle::declaration(std::uint64_t number) const {
     return number < declarations_.size() ? declarations_[number] : nullptr;
@@ -95,28 +79,10 @@ bool TStyle::apply() {
     if (instruction_ == nullptr)
         return false;
 
-    // Numbers past the last graph name nothing, so the list never grows beyond the graph count.
-    const std::vector<GrrUviza*> graphs = allGraphs(target_);
-    const std::uint64_t kept = std::max<std::uint64_t>(graphs.size(), 1);
-    declarations_.clear();
-    extent_ = 0;
-    DOMNodeList* styles = instruction_->getElementsByTagName(GrxUni::_style);
-    for (XMLSize_t i = 0, count = styles->getLength(); i < count; ++i) {
-        auto* declaration = static_cast<DOMElement*>(styles->item(i));
-        const std::uint64_t number =
-            ChartString(declaration->getAttribute(GrxUni::_number)).convertToInteger();
-        extent_ = std::max(extent_, number + 1);
-        if (number >= kept)
-            continue;
-        if (declarations_.size() <= number)
-            declarations_.resize(number + 1, nullptr);
-        declarations_[number] = declaration;
-    }
-
-    const XMLCh* type = instruction_->getAttribute(kType);
+    const XMLCh* type = instruction_->getAttribute(GrxUni::_type);
     if (*type == 0)
         return styleById();
-    if (same(type, GrxUni::_text) || same(type, kTextFrame) || same(type, GrxUni::_labelFrame)) {
+    if (same(type, GrxUni::_text) || same(type, BaseTemplate::_textFrame) || same(type, GrxUni::_labelFrame)) {
         styleTexts();
         return true;
     }
@@ -132,21 +98,11 @@ bool TStyle::styleById() {
     // An empty id names no style: it would otherwise pick whichever style happens to have none.
     if (*wanted == 0 || declaration0 == nullptr)
         return false;
-    // Depth first, each style before the styles nested in it; an explicit stack, since nesting
-    // comes from the chart document and can be deep.
-    const std::vector<GrxStyle*> top = target_.getStyles();
-    std::vector<GrxStyle*> pending(top.rbegin(), top.rend());
-    while (!pending.empty()) {
-        GrxStyle* style = pending.back();
-        pending.pop_back();
-        if (same(style->getId(), wanted)) {
-            importStyle(declaration0, *style);
-            return true;
-        }
-        const std::vector<GrxStyle*> nested = style->getStyles();
-        pending.insert(pending.end(), nested.rbegin(), nested.rend());
-    }
-    return false;
+    GrxStyle* style = styleWithId(target_, wanted);
+    if (style == nullptr)
+        return false;
+    importStyle(declaration0, *style);
+    return true;
 }
 
 // ---- element types --------------------------------------------------------------------------------
@@ -198,7 +154,7 @@ struct ElementStyling {
     // Clustered bars take only the "clustered" declaration, plain bars only the other one, and a
     // bar moved by position modifier 7 neither.
     void barRule(const GrrUviza& graph, GrxInterval& interval, DOMElement& declaration) const {
-        const bool clustered = same(subtype, kClustered);
+        const bool clustered = same(subtype, BaseTemplate::_clustered);
         const bool styled =
             action.isGraphClustered(graph) ? clustered : !clustered && interval.getPositionModifier() != 7;
         if (styled)
@@ -213,11 +169,11 @@ struct ElementStyling {
         const bool polar = action.isGraphPolar(graph);
 
         // Intervals drawn as lines or I-beams are drop lines and error bars whatever else they are.
-        if (lineSymbol && is(u"dropline")) {
+        if (lineSymbol && is(BaseTemplate::_dropline)) {
             styleElement(interval, declaration, false);
             return;
         }
-        if ((lineSymbol || ibeamSymbol) && is(u"errorbar")) {
+        if ((lineSymbol || ibeamSymbol) && is(BaseTemplate::_errorbar)) {
             styleElement(interval, declaration, false);
             return;
         }
@@ -227,13 +183,13 @@ struct ElementStyling {
         bool fallThrough = false;
         const ChartString id(interval.getId());
         if (id.ContainsString(u"dropdownline")) {
-            if (is(u"dropline")) {
+            if (is(BaseTemplate::_dropline)) {
                 styleElement(interval, declaration, false);
                 return;
             }
             fallThrough = true;
         } else if (id.ContainsString(u"errorbar")) {
-            if (is(u"errorbar")) {
+            if (is(BaseTemplate::_errorbar)) {
                 styleElement(interval, declaration, false);
                 return;
             }
@@ -243,12 +199,12 @@ struct ElementStyling {
         if (!fallThrough) {
             const std::vector<GrxSummaryStatistic*> summaries = interval.getSummaryStatistics();
             if (!interval.getBinStatistics().empty() && !summaries.empty()) {
-                if (is(u"histogram") || is(u"population"))
+                if (is(GrxUni::_histogram) || is(GrxUni::_population))
                     styleElement(interval, declaration, false);
                 return;
             }
             if (polar) {
-                if (is(u"pie"))
+                if (is(BaseTemplate::_pie))
                     styleElement(interval, declaration, true);
                 return;
             }
@@ -283,8 +239,8 @@ struct ElementStyling {
 } // namespace
 
 void TStyle::styleElements() {
-    const ElementStyling styling{*this, instruction_->getAttribute(kType),
-                                 instruction_->getAttribute(kSubtype)};
+    const ElementStyling styling{*this, instruction_->getAttribute(GrxUni::_type),
+                                 instruction_->getAttribute(GrxUni::_subtype)};
     const bool scatter = styling.is(BaseTemplate::_scatter);
     const bool line = styling.is(GrxUni::_line);
     const bool area = styling.is(GrxUni::_area);
@@ -302,9 +258,7 @@ void TStyle::styleElements() {
         const GrrUviza& graph = *graphs[g];
         const ChartString coordinate(declaration->getAttribute(GrxUni::_coordinate));
         const bool threeD = !getDimensionsByRole(graph, ChartString(GrxUni::_z)).empty();
-        std::vector<CTElementType*> elements;
-        getAllElements(graph, elements);
-        for (CTElementType* element : elements) {
+        for (CTElementType* element : elementsOf(graph)) {
             if (!doesCoordinateMatch(*element, coordinate) || isExcluded(*element))
                 continue;
             if (scatter) {
@@ -518,7 +472,7 @@ struct TextStyling {
         if (subHas(GrxUni::_legend))
             styleLegendTicks(declaration);
         GrxLabel* label = nullptr;
-        if (const XMLCh* titleRole = role(u"xaxis_title", u"yaxis_title", u"zaxis_title"))
+        if (const XMLCh* titleRole = role(BaseTemplate::_xaxis_title, BaseTemplate::_yaxis_title, BaseTemplate::_zaxis_title))
             label = axisTitle(titleRole);
         else
             label = slotLabel();
@@ -539,9 +493,9 @@ struct TextStyling {
 } // namespace
 
 void TStyle::styleTexts() {
-    const XMLCh* type = instruction_->getAttribute(kType);
+    const XMLCh* type = instruction_->getAttribute(GrxUni::_type);
     const TextStyling styling{*this, target_, *instruction_,
-                              ChartString(instruction_->getAttribute(kSubtype)), same(type, kTextFrame)};
+                              ChartString(instruction_->getAttribute(GrxUni::_subtype)), same(type, BaseTemplate::_textFrame)};
     const bool labelFrame = same(type, GrxUni::_labelFrame);
     for (const DOMNode* n = instruction_->getFirstChild(); n != nullptr; n = n->getNextSibling()) {
         if (n->getNodeType() != DOMNode::ELEMENT_NODE || !same(n->getNodeName(), GrxUni::_style))
@@ -553,5 +507,11 @@ void TStyle::styleTexts() {
             styling.styleText(declaration);
     }
 }
+
+namespace {
+
+const ActionFamily family{{u"setStyle", "TStyle", makeAction<TStyle>}};
+
+} // namespace
 
 } // namespace plotaid::detail

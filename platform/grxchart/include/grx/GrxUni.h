@@ -289,6 +289,24 @@ struct GrxUni {
     static constexpr XMLCh _zLocation[] = u"zLocation";
     static constexpr XMLCh _zOrder[] = u"zOrder";
     static constexpr XMLCh _zscale[] = u"zscale";
+
+    // Words of the template grammar alone: instruction attributes, children and their values.
+    static constexpr XMLCh _aestheticNumber[] = u"aestheticNumber";
+    static constexpr XMLCh _affect[] = u"affect";
+    static constexpr XMLCh _clamp[] = u"clamp";
+    static constexpr XMLCh _elementName[] = u"elementName";
+    static constexpr XMLCh _elementType[] = u"elementType";
+    static constexpr XMLCh _hidden[] = u"hidden";
+    static constexpr XMLCh _histogram[] = u"histogram";
+    static constexpr XMLCh _missing[] = u"missing";
+    static constexpr XMLCh _parentName[] = u"parentName";
+    static constexpr XMLCh _pointPosition[] = u"pointPosition";
+    static constexpr XMLCh _population[] = u"population";
+    static constexpr XMLCh _split[] = u"split";
+    static constexpr XMLCh _styleName[] = u"styleName";
+    static constexpr XMLCh _subtype[] = u"subtype";
+    static constexpr XMLCh _tickFrameStyle[] = u"tickFrameStyle";
+    static constexpr XMLCh _xmlns[] = u"xmlns";
 };
 
 #endif
