@@ -1,6 +1,8 @@
 #ifndef PLOTAID_TESTS_SUPPORT_ENGINESUPPORT_H
 #define PLOTAID_TESTS_SUPPORT_ENGINESUPPORT_H
 
+#include "support/TestSupport.h"
+
 #include "foundation/RecordSink.h"
 #include "foundation/ValidatingParser.h"
 #include "foundation/XercesRuntime.h"
@@ -11,23 +13,14 @@
 
 #include <gtest/gtest.h>
 
-#include <fstream>
 #include <memory>
-#include <sstream>
 #include <string>
 #include <vector>
 
 namespace engine_test {
 
-inline std::string readText(const std::string& path) {
-    std::ifstream in(path, std::ios::binary);
-    std::ostringstream out;
-    out << in.rdbuf();
-    return out.str();
-}
-
 inline std::string example(const std::string& relative) {
-    return readText(std::string(PLOTAID_EXAMPLES_DIR) + "/" + relative);
+    return readAll(std::string(PLOTAID_EXAMPLES_DIR) + "/" + relative);
 }
 
 // Keeps Xerces-C up for the objects a test makes.

@@ -1,4 +1,5 @@
 #include "support/GrammarSupport.h"
+#include "support/TestSupport.h"
 
 #include "foundation/ValidatingParser.h"
 
@@ -8,39 +9,28 @@
 
 #include <xercesc/dom/DOM.hpp>
 
-#include <map>
-
 #include <algorithm>
 #include <cstdio>
 #include <cstdlib>
 #include <filesystem>
 #include <fstream>
-#include <iterator>
+#include <map>
 #include <stdexcept>
-#include <sys/wait.h>
 
 namespace grammar_test {
 namespace fs = std::filesystem;
 
 namespace {
 // Made on first use, removed with everything in it when the test program ends.
-struct ScratchFolder {
-    std::string path;
-    ScratchFolder() {
-        std::string pattern = (fs::temp_directory_path() / "plotaid-grammar-XXXXXX").string();
-        if (::mkdtemp(pattern.data()) == nullptr)
-            throw std::runtime_error("cannot make a scratch folder");
-        path = pattern + "/";
-    }
-    ~ScratchFolder() {
-        std::error_code ignored;
-        fs::remove_all(path, ignored);
-    }
-};
-
 const std::string& scratchFolder() {
-    static const ScratchFolder folder;
-    return folder.path;
+    static const TempDir folder;
+    static const std::string path =
+        folder.path().empty() ? throw std::runtime_error("no scratch folder") : folder.path() + "/";
+    return path;
+}
+
+std::string schemaFolder() {
+    return std::string(PLOTAID_SOURCE_DIR) + "/resources/schemas/";
 }
 
 std::string quoted(const std::string& s) {
@@ -68,10 +58,6 @@ const std::string& catalog() {
 }
 } // namespace
 
-std::string schemaFolder() {
-    return std::string(PLOTAID_SOURCE_DIR) + "/resources/schemas/";
-}
-
 std::vector<std::string> sampleCharts() {
     std::vector<std::string> charts;
     for (const auto& entry : fs::directory_iterator(std::string(PLOTAID_EXAMPLES_DIR) + "/charts"))
@@ -82,28 +68,21 @@ std::vector<std::string> sampleCharts() {
 }
 
 std::string readText(const std::string& path) {
-    std::ifstream in(path, std::ios::binary);
-    if (!in)
+    if (!std::ifstream(path))
         throw std::runtime_error("cannot read " + path);
-    return std::string(std::istreambuf_iterator<char>(in), std::istreambuf_iterator<char>());
+    return readAll(path);
 }
 
 std::string writeScratch(const std::string& name, const std::string& text) {
     const std::string path = scratchFolder() + name;
-    std::ofstream out(path, std::ios::binary | std::ios::trunc);
-    out << text;
-    if (!out)
+    if (!(std::ofstream(path, std::ios::binary | std::ios::trunc) << text))
         throw std::runtime_error("cannot write " + path);
     return path;
 }
 
 std::string replaceOnce(const std::string& text, const std::string& from, const std::string& to) {
     const std::string::size_type at = text.find(from);
-    if (at == std::string::npos)
-        return std::string();
-    std::string out = text;
-    out.replace(at, from.size(), to);
-    return out;
+    return at == std::string::npos ? std::string() : std::string(text).replace(at, from.size(), to);
 }
 
 bool haveXmllint() {
@@ -111,39 +90,25 @@ bool haveXmllint() {
 }
 
 LintResult xmllint(const std::string& schema, const std::string& file) {
-    const std::string command = "XML_CATALOG_FILES=" + quoted(catalog()) +
-                                " xmllint --nonet --noout --schema " + quoted(schemaFolder() + schema) + " " +
-                                quoted(file) + " 2>&1";
-    LintResult result;
-    FILE* pipe = ::popen(command.c_str(), "r");
-    if (pipe == nullptr)
-        return result;
-    char buffer[4096];
-    std::size_t n;
-    while ((n = std::fread(buffer, 1, sizeof buffer, pipe)) > 0)
-        result.output.append(buffer, n);
-    const int status = ::pclose(pipe);
-    result.exitCode = WIFEXITED(status) ? WEXITSTATUS(status) : -1;
-    return result;
+    return runCommand("XML_CATALOG_FILES=" + quoted(catalog()) + " xmllint --nonet --noout --schema " +
+                      quoted(schemaFolder() + schema) + " " + quoted(file) + " 2>&1");
 }
 
 void useSourceGrammars() {
-    static const bool done = [] {
-        // The grammars both directly inside the folder and in its schemas/ subfolder, so the test
-        // holds whichever of the two the resolver reads.
+    [[maybe_unused]] static const bool done = [] {
+        // The grammars both directly inside the folder and in its schemas/
+        // subfolder, so the test holds whichever of the two the resolver reads.
         const std::string folder = scratchFolder() + "resources/";
         fs::create_directories(folder + "schemas");
         for (const auto& entry : fs::directory_iterator(schemaFolder())) {
             if (entry.path().extension() != ".xsd")
                 continue;
-            fs::copy_file(entry.path(), folder + entry.path().filename().string(),
-                          fs::copy_options::overwrite_existing);
-            fs::copy_file(entry.path(), folder + "schemas/" + entry.path().filename().string(),
-                          fs::copy_options::overwrite_existing);
+            for (const std::string& to : {folder, folder + "schemas/"})
+                fs::copy_file(entry.path(), to + entry.path().filename().string(),
+                              fs::copy_options::overwrite_existing);
         }
         return ::setenv("PLOTAID_RESOURCE_DIR", folder.c_str(), 1) == 0;
     }();
-    (void)done;
 }
 
 std::string dataDocument(const std::string& sources) {
@@ -156,38 +121,13 @@ std::string dataDocument(const std::string& sources) {
            sources + "</gs:graphSources>\n";
 }
 
-std::string xercesFaults(const std::string& chart) {
-    plotaid::detail::ValidatingParser parser;
-    if (parser.parse(chart, "chart", ChartException("chart under test", "grammar_test", 0)) != nullptr)
-        return std::string();
-    std::string out = "Xerces rejects the chart: ";
-    for (const std::string& e : parser.lastErrors())
-        out += e + "; ";
-    return out;
-}
-
-std::string xmllintFaults(const std::string& chart) {
-    if (!haveXmllint())
-        return std::string();
-    static unsigned counter = 0;
-    const std::string file = writeScratch("chart-" + std::to_string(++counter) + ".xml", chart);
-    const LintResult result = xmllint("grxml-2.9.xsd", file);
-    std::remove(file.c_str());
-    return result.exitCode == 0 ? std::string() : "xmllint rejects the chart: " + result.output;
-}
-
 std::string duplicateIds(const XERCES_CPP_NAMESPACE::DOMDocument* document) {
     using namespace XERCES_CPP_NAMESPACE;
     std::map<std::string, int> counts;
-    std::vector<const DOMElement*> pending{document->getDocumentElement()};
-    while (!pending.empty()) {
-        const DOMElement* e = pending.back();
-        pending.pop_back();
-        if (e->getAttributeNode(u"id") != nullptr)
+    const DOMNodeList* all = document->getElementsByTagName(u"*");
+    for (XMLSize_t i = 0; i < all->getLength(); ++i)
+        if (const auto* e = static_cast<const DOMElement*>(all->item(i)); e->getAttributeNode(u"id"))
             ++counts[ChartString(e->getAttribute(u"id")).toUTF8()];
-        for (const DOMElement* c = e->getFirstElementChild(); c; c = c->getNextElementSibling())
-            pending.push_back(c);
-    }
     std::string out;
     for (const auto& [id, count] : counts)
         if (count > 1)
@@ -196,8 +136,20 @@ std::string duplicateIds(const XERCES_CPP_NAMESPACE::DOMDocument* document) {
 }
 
 std::string chartFaults(const std::string& chart) {
-    const std::string faults = xercesFaults(chart);
-    return faults.empty() ? xmllintFaults(chart) : faults;
+    plotaid::detail::ValidatingParser parser;
+    if (parser.parse(chart, "chart", ChartException("chart under test", "grammar_test", 0)) == nullptr) {
+        std::string out = "Xerces rejects the chart: ";
+        for (const std::string& e : parser.lastErrors())
+            out += e + "; ";
+        return out;
+    }
+    if (!haveXmllint())
+        return std::string();
+    static unsigned counter = 0;
+    const std::string file = writeScratch("chart-" + std::to_string(++counter) + ".xml", chart);
+    const LintResult result = xmllint("grxml-2.9.xsd", file);
+    std::remove(file.c_str());
+    return result.exitCode == 0 ? std::string() : "xmllint rejects the chart: " + result.output;
 }
 
 std::string chartFaults(const GrxVisualization& chart) {

@@ -1,6 +1,8 @@
 #ifndef PLOTAID_TESTS_GRAMMAR_GRAMMARSUPPORT_H
 #define PLOTAID_TESTS_GRAMMAR_GRAMMARSUPPORT_H
 
+#include "support/ToolRunner.h"
+
 #include <xercesc/util/XercesDefs.hpp>
 
 #include <string>
@@ -14,8 +16,6 @@ class GrxVisualization;
 
 namespace grammar_test {
 
-// The resources/schemas folder of the source tree, ending with '/'.
-std::string schemaFolder();
 // Every sample chart under examples/charts, sorted.
 std::vector<std::string> sampleCharts();
 
@@ -27,10 +27,7 @@ std::string writeScratch(const std::string& name, const std::string& text);
 // variant that silently stayed valid cannot pass for a broken one.
 std::string replaceOnce(const std::string& text, const std::string& from, const std::string& to);
 
-struct LintResult {
-    int exitCode = -1;
-    std::string output;
-};
+using LintResult = ToolResult;
 // Validates file against schema (a file name under resources/schemas) with the xmllint binary, a
 // validator independent of Xerces-C. Schema URIs are mapped to the source tree through an XML
 // catalog and the network is off, so imports resolve exactly as the library resolves them.
@@ -41,15 +38,12 @@ bool haveXmllint();
 // source tree's grammars, so the resolver finds them by file name.
 void useSourceGrammars();
 
-// Soundness of a chart the library produced, each empty when sound (else what is wrong):
-// what the library's own validating parser says of the text;
-std::string xercesFaults(const std::string& chart);
-// what xmllint says of it against grxml-2.9.xsd (empty as well when xmllint is missing);
-std::string xmllintFaults(const std::string& chart);
+// Soundness of a chart the library produced, empty when sound (else what is wrong):
 // ids held by more than one element (the library's parser lets them pass);
 std::string duplicateIds(const XERCES_CPP_NAMESPACE::DOMDocument* document);
-// all three, on the chart printed as the library prints it.
+// what the library's validating parser, then xmllint on grxml-2.9.xsd (when installed), say;
 std::string chartFaults(const std::string& chart);
+// both, and the ids, on the chart as the library prints it.
 std::string chartFaults(const GrxVisualization& chart);
 
 // The data document of a small store, byte for byte as the XML data handler writes it.

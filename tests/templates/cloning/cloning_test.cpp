@@ -1,46 +1,22 @@
 // Copying the content of one chart object onto another under fresh ids.
-#include "support/EngineSupport.h"
-#include "support/GrammarSupport.h"
-
-#include <plotaid/BaseTemplate.h>
-
-#include <xercesc/dom/DOM.hpp>
+#include "templates/TemplateSupport.h"
 
 #include <sstream>
 
-using engine_test::Chart;
+using namespace template_test;
 
 namespace {
 
-// The base as an action that does nothing, to reach its shared operations.
-class Probe : public BaseTemplate {
-public:
-    using BaseTemplate::BaseTemplate;
-    bool apply() override { return false; }
-};
-
-std::string utf8(const XMLCh* s) {
-    return ChartString(s).toUTF8();
-}
-
 // A fresh id: made from `prefix`, and not the id it was copied from.
 bool fresh(const XMLCh* id, const std::string& prefix, const std::string& old) {
-    return utf8(id).rfind(prefix, 0) == 0 && utf8(id) != old;
+    return u8(id).rfind(prefix, 0) == 0 && u8(id) != old;
 }
 
 // The scatter sample: a point with a shape and a colour by gender, both listed by the legend.
-class Cloning : public engine_test::EngineTest {
+class Cloning : public TemplateTest {
 protected:
-    void SetUp() override {
-        chart_ = Chart::parse(engine_test::example("charts/scatter.xml"));
-        ASSERT_TRUE(chart_.vis);
-        graph_ = chart_.vis->getGraphs().at(0);
-        point_ = graph_->getPoints().at(0);
-        legend_ = chart_.vis->getLegends().at(0);
-        repository_ = chart_.vis->getExtension()->getStyleCycleRepository();
-        ASSERT_NE(repository_, nullptr);
-    }
-    Probe probe() { return Probe(nullptr, *chart_.vis, nullptr); }
+    void SetUp() override { ASSERT_NE(repository_, nullptr); }
+    Probe probe() { return Probe(nullptr, chart_, nullptr); }
     // Adds a style to the cycle, dashed when `dashes` is given.
     static GrxStyle& styleIn(GrxCycle& cycle, const XMLCh* dashes) {
         GrxStyle& style = cycle.addStyle();
@@ -52,22 +28,22 @@ protected:
     int listed(const GrxBaseElement& aesthetic) const {
         int n = 0;
         for (const GrxLegendTarget* t : legend_->getLegendTargets())
-            n += utf8(t->GetAttribute(GrxUni::_target)) == utf8(aesthetic.GetAttribute(GrxUni::_id));
+            n += u8(t->GetAttribute(GrxUni::_target)) == u8(aesthetic.GetAttribute(GrxUni::_id));
         return n;
     }
     // A style's attribute of every style of the cycle's first cycle, joined by '|'.
     static std::string styles(const GrxStyleCycle* sc, const XMLCh* name) {
         std::string out;
         for (const GrxStyle* s : sc->getCycles().at(0)->getStyles())
-            out += utf8(s->GetAttribute(name)) + "|";
+            out += u8(s->GetAttribute(name)) + "|";
         return out;
     }
 
-    Chart chart_;
-    GrrUviza* graph_ = nullptr;
-    GrxPoint* point_ = nullptr;
-    GrxLegend* legend_ = nullptr;
-    GrxStyleCycle* repository_ = nullptr;
+    GrxVisualization& chart_ = sample("scatter.xml");
+    GrrUviza* graph_ = chart_.getGraphs().at(0);
+    GrxPoint* point_ = graph_->getPoints().at(0);
+    GrxLegend* legend_ = chart_.getLegends().at(0);
+    GrxStyleCycle* repository_ = chart_.getExtension()->getStyleCycleRepository();
 };
 
 TEST_F(Cloning, APointOntoALineTurnsShapesIntoDashesOfTheRepositoryDashCycle) {
@@ -81,7 +57,7 @@ TEST_F(Cloning, APointOntoALineTurnsShapesIntoDashesOfTheRepositoryDashCycle) {
     ASSERT_EQ(line.getDashs().size(), 1u);
     const GrxDash& dash = *line.getDashs()[0];
     EXPECT_TRUE(fresh(dash.getId(), "shape", "shape_1"));
-    EXPECT_EQ(utf8(dash.GetAttribute(GrxUni::_variable)) + " " + utf8(dash.GetAttribute(GrxUni::_domain)),
+    EXPECT_EQ(u8(dash.GetAttribute(GrxUni::_variable)) + " " + u8(dash.GetAttribute(GrxUni::_domain)),
               "var_gender domain_gender");
     // A new style cycle holding copies of the repository's dash styles, without their ids.
     const GrxStyleCycle* made = dash.getCycle();
@@ -94,7 +70,7 @@ TEST_F(Cloning, APointOntoALineTurnsShapesIntoDashesOfTheRepositoryDashCycle) {
     EXPECT_TRUE(fresh(colour.getId(), "color", "color_1"));
     EXPECT_EQ(colour.getCycle(), repository_);
     ASSERT_TRUE(line.getX() && line.getY());
-    EXPECT_EQ(utf8(line.getY()->GetAttribute(GrxUni::_variable)), "var_salary");
+    EXPECT_EQ(u8(line.getY()->GetAttribute(GrxUni::_variable)), "var_salary");
     EXPECT_EQ(line.getCoordinates(), point_->getCoordinates());
     EXPECT_TRUE(line.isDotPresent() && !line.getDot());
     // Both are childless, so the legend lists them beside the old ones.
@@ -111,11 +87,11 @@ TEST_F(Cloning, TheLastDashCycleOfTheRepositoryIsTakenOrNone) {
     styleIn(third, nullptr);
     styleIn(third, u"4 2");
     GrxPath& path = graph_->addPath();
-    const std::size_t cyclesBefore = chart_.vis->getStyleCycles().size();
+    const std::size_t cyclesBefore = chart_.getStyleCycles().size();
     probe().cloneElementAesthetics(*point_, path, false);
     ASSERT_EQ(path.getDashs().size(), 1u);
     EXPECT_FALSE(path.getDashs()[0]->isCyclePresent());
-    EXPECT_EQ(chart_.vis->getStyleCycles().size(), cyclesBefore);
+    EXPECT_EQ(chart_.getStyleCycles().size(), cyclesBefore);
     EXPECT_EQ(listed(*path.getDashs()[0]), 0); // no legend flag
 
     GrxCycle& second = repository_->addCycle();
@@ -136,7 +112,7 @@ TEST_F(Cloning, APointOntoAPointKeepsShapesMappingsScalesStatisticsAndStyledCond
     colour.addScale(2).setInvert(true);
     colour.addColorMapping().setTo(u"red");
     colour.addSummaryStatistic().setMethod(4);
-    GrxStyle& style = chart_.vis->addStyle();
+    GrxStyle& style = chart_.addStyle();
     style.setId(u"highlight");
     point_->addConditionalStyle(ChartString("x > 10"), style);
     point_->addConditionalStyle(ChartString("y > 5"), style).SetAttribute(GrxUni::_style, u"nowhere");
@@ -148,7 +124,7 @@ TEST_F(Cloning, APointOntoAPointKeepsShapesMappingsScalesStatisticsAndStyledCond
     const GrxShape& shape = *copy.getShapes()[0];
     EXPECT_EQ(shape.getCycle(), repository_);
     ASSERT_EQ(shape.getSymbolMappings().size(), 1u);
-    EXPECT_EQ(utf8(shape.getSymbolMappings()[0]->getTo()), "square");
+    EXPECT_EQ(u8(shape.getSymbolMappings()[0]->getTo()), "square");
     // The new scale starts as method 3; only what the old one says is copied over it.
     ASSERT_NE(shape.getScale(), nullptr);
     EXPECT_EQ(shape.getScale()->getMethod(), 3);
@@ -156,7 +132,7 @@ TEST_F(Cloning, APointOntoAPointKeepsShapesMappingsScalesStatisticsAndStyledCond
     ASSERT_TRUE(made.getScale() && made.getSummaryStatistic());
     EXPECT_TRUE(made.getScale()->getMethod() == 2 && made.getScale()->getInvert());
     ASSERT_EQ(made.getColorMappings().size(), 1u);
-    EXPECT_EQ(utf8(made.getColorMappings()[0]->getTo()), "red");
+    EXPECT_EQ(u8(made.getColorMappings()[0]->getTo()), "red");
     EXPECT_EQ(made.getSummaryStatistic()->getMethod(), 4);
     // Aesthetics with children get no legend entry.
     EXPECT_EQ(listed(shape) + listed(made), 0);
@@ -164,7 +140,7 @@ TEST_F(Cloning, APointOntoAPointKeepsShapesMappingsScalesStatisticsAndStyledCond
     // A condition whose style names nothing is skipped, and reported.
     EXPECT_FALSE(probe().cloneConditionalStyles(*point_, copy));
     ASSERT_EQ(copy.getConditionalStyles().size(), 1u);
-    EXPECT_EQ(utf8(copy.getConditionalStyles()[0]->getWhen()), "x > 10");
+    EXPECT_EQ(u8(copy.getConditionalStyles()[0]->getWhen()), "x > 10");
     EXPECT_EQ(copy.getConditionalStyles()[0]->getStyle(), &style);
 }
 
@@ -183,8 +159,7 @@ TEST_F(Cloning, OntoALabelingOnlyStyleBysComponentsColoursAndSizesWithTheElement
                   labeling.getColors().size(),
               3u);
     ASSERT_EQ(labeling.getSizes().size(), 1u);
-    EXPECT_EQ(utf8(labeling.getSizes()[0]->getLow()) + "-" + utf8(labeling.getSizes()[0]->getHigh()),
-              "6pt-18pt");
+    EXPECT_EQ(u8(labeling.getSizes()[0]->getLow()) + "-" + u8(labeling.getSizes()[0]->getHigh()), "6pt-18pt");
     EXPECT_TRUE(fresh(labeling.getSizes()[0]->getId(), "length", ""));
 
     // Onto an interval, a size without bounds gets the interval's; one with a bound keeps it alone.
@@ -193,8 +168,8 @@ TEST_F(Cloning, OntoALabelingOnlyStyleBysComponentsColoursAndSizesWithTheElement
     probe().cloneElementAesthetics(*point_, interval, false);
     const std::vector<GrxSize*> sizes = interval.getSizes();
     ASSERT_EQ(sizes.size(), 2u);
-    EXPECT_EQ(utf8(sizes[0]->getLow()) + "-" + utf8(sizes[0]->getHigh()), "0.25pt-3pt");
-    EXPECT_TRUE(utf8(sizes[1]->getLow()) == "1pt" && !sizes[1]->isHighPresent());
+    EXPECT_EQ(u8(sizes[0]->getLow()) + "-" + u8(sizes[0]->getHigh()), "0.25pt-3pt");
+    EXPECT_TRUE(u8(sizes[1]->getLow()) == "1pt" && !sizes[1]->isHighPresent());
 }
 
 TEST_F(Cloning, StyleBysTakeTheirReferencesAndACopyOfTheirCycle) {
@@ -210,7 +185,7 @@ TEST_F(Cloning, StyleBysTakeTheirReferencesAndACopyOfTheirCycle) {
     const GrxStyleBy& made = *line.getStyleBys()[0];
     EXPECT_TRUE(fresh(made.getId(), "styleBy", "styleBy_gender"));
     for (const XMLCh* name : {GrxUni::_dimension, GrxUni::_domain, GrxUni::_variable})
-        EXPECT_EQ(utf8(made.GetAttribute(name)), utf8(styleBy.GetAttribute(name)));
+        EXPECT_EQ(u8(made.GetAttribute(name)), u8(styleBy.GetAttribute(name)));
     ASSERT_TRUE(made.getCycle() != nullptr && made.getCycle() != repository_);
     EXPECT_EQ(styles(made.getCycle(), GrxUni::_color), styles(repository_, GrxUni::_color));
     EXPECT_EQ(styles(made.getCycle(), GrxUni::_id).find_first_not_of('|'), std::string::npos);
@@ -223,7 +198,7 @@ TEST_F(Cloning, StyleBysTakeTheirReferencesAndACopyOfTheirCycle) {
 }
 
 TEST_F(Cloning, AStyleCycleOfTheElementKeepsOnlyColoursSwappedFromAPoint) {
-    GrxStyleCycle& own = chart_.vis->addStyleCycle(ChartString("ownCycle"));
+    GrxStyleCycle& own = chart_.addStyleCycle(ChartString("ownCycle"));
     GrxStyle& first = own.addCycle().addStyle();
     first.setColor(u"red");
     first.setColor2(u"black");
@@ -243,15 +218,15 @@ TEST_F(Cloning, AStyleCycleOfTheElementKeepsOnlyColoursSwappedFromAPoint) {
         probe().cloneStyleCycle(to, *point_, u"labelCycle", ChartString(c.from), ChartString(c.to));
         ASSERT_EQ(to.getStyleBys().size(), 1u);
         const GrxStyleBy& made = *to.getStyleBys()[0];
-        EXPECT_EQ(utf8(made.GetAttribute(GrxUni::_variable)), "var_gender");
+        EXPECT_EQ(u8(made.GetAttribute(GrxUni::_variable)), "var_gender");
         ASSERT_NE(made.getCycle(), nullptr);
         EXPECT_TRUE(fresh(made.getCycle()->getId(), "labelCycle", ""));
         const GrxStyle& style = *made.getCycle()->getCycles().at(0)->getStyles().at(0);
-        EXPECT_EQ(utf8(style.getColor()) + "/" + utf8(style.getColor2()), c.colours);
+        EXPECT_EQ(u8(style.getColor()) + "/" + u8(style.getColor2()), c.colours);
         EXPECT_FALSE(style.isSymbolPresent());
     }
     // The new style-by's variable is a source or an expression variable only.
-    GrxDerivedVariable& derived = chart_.vis->addDerivedVariable();
+    GrxDerivedVariable& derived = chart_.addDerivedVariable();
     derived.setId(u"derived1");
     styleBy.removeCycle();
     styleBy.setVariable(derived);
@@ -264,7 +239,7 @@ TEST_F(Cloning, AStyleCycleOfTheElementKeepsOnlyColoursSwappedFromAPoint) {
 TEST_F(Cloning, ColourTwoReplacesColourWhereUnsetOrForcedAndColoursTurnMain) {
     // One style per "colour/colour2" word; "-" leaves one out.
     const auto cycleOf = [&](const std::string& words) -> GrxStyleCycle& {
-        GrxStyleCycle& sc = chart_.vis->addStyleCycle(probe().CreateUniqueId(ChartString("swap")));
+        GrxStyleCycle& sc = chart_.addStyleCycle(probe().CreateUniqueId(ChartString("swap")));
         GrxCycle& cycle = sc.addCycle();
         std::istringstream in(words);
         for (std::string word; in >> word;) {
@@ -308,7 +283,7 @@ TEST_F(Cloning, ColourTwoReplacesColourWhereUnsetOrForcedAndColoursTurnMain) {
 TEST_F(Cloning, CloneLegendEntryAddsATargetPerMatchingTargetOfEveryLegend) {
     GrxColor& made = graph_->addLine().addColor();
     made.setId(probe().CreateUniqueId(ChartString("color")));
-    GrxLegend& second = chart_.vis->addLegend();
+    GrxLegend& second = chart_.addLegend();
     second.setId(u"legend_2");
     second.addLegendTarget(*point_->getShapes()[0]).setId(u"legend_2_target1");
     second.addLegendTarget(*point_->getColors()[0]).setId(u"legend_2_target2");
@@ -323,15 +298,12 @@ TEST_F(Cloning, CloneLegendEntryAddsATargetPerMatchingTargetOfEveryLegend) {
     EXPECT_EQ(legend_->getLegendTargets().size(), count);
 }
 
-// Every element of every sample chart cloned onto a new line and a new point, labelings included:
-// the ids stay unique and the chart stays valid.
-TEST(ClonedSamples, StayValidWithUniqueIds) {
-    plotaid::detail::XercesRuntime runtime;
+// Onto a new line and a new point, labelings included.
+TEST_F(Cloning, EveryElementOfEverySampleClonedStaysValidWithUniqueIds) {
     for (const std::string& path : grammar_test::sampleCharts()) {
-        Chart chart = Chart::parse(grammar_test::readText(path));
-        ASSERT_TRUE(chart.vis) << path;
-        Probe probe(nullptr, *chart.vis, nullptr);
-        for (GrrUviza* graph : chart.vis->getGraphs()) {
+        GrxVisualization& chart = parse(grammar_test::readText(path));
+        Probe probe(nullptr, chart, nullptr);
+        for (GrrUviza* graph : chart.getGraphs()) {
             std::vector<CTElementType*> elements;
             BaseTemplate::getAllElements(*graph, elements);
             for (CTElementType* element : elements) {
@@ -341,7 +313,7 @@ TEST(ClonedSamples, StayValidWithUniqueIds) {
                     probe.cloneElementAesthetics(*element, *labeling, true);
             }
         }
-        EXPECT_EQ(grammar_test::chartFaults(*chart.vis), "") << path;
+        EXPECT_EQ(grammar_test::chartFaults(chart), "") << path;
     }
 }
 

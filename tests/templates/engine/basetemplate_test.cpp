@@ -1,212 +1,181 @@
-#include "support/EngineSupport.h"
+// The operations every action shares: styles, graphs, dimensions, elements and variables.
+#include "templates/TemplateSupport.h"
 
-#include <plotaid/BaseTemplate.h>
-
-#include <xercesc/dom/DOM.hpp>
-
-using namespace XERCES_CPP_NAMESPACE;
-using engine_test::Chart;
+using namespace template_test;
 
 namespace {
 
-// The base as an action that does nothing, to reach its shared operations.
-class Probe : public BaseTemplate {
-public:
-    using BaseTemplate::BaseTemplate;
-    bool apply() override { return false; }
-};
-
-class BaseTemplateTest : public engine_test::EngineTest {
+class BaseTemplateTest : public TemplateTest {
 protected:
-    void SetUp() override {
-        chart_ = Chart::empty();
-        instructions_ = Chart::empty();
-    }
     // An instruction element with the given attributes.
     const DOMElement* instruction(std::initializer_list<std::pair<const XMLCh*, const XMLCh*>> attributes) {
-        DOMElement* e = instructions_.document()->createElement(u"setStyle");
-        instructions_.document()->getDocumentElement()->appendChild(e);
+        DOMElement* e = root(chart_)->getOwnerDocument()->createElement(u"setStyle");
         for (const auto& [name, value] : attributes)
             e->setAttribute(name, value);
         return e;
     }
-    GrrUviza& graph() { return chart_.vis->addGraph(); }
-    Chart chart_, instructions_;
+    GrxVisualization& chart_ = empty();
+    GrrUviza& g_ = chart_.addGraph();
+    Probe probe_{nullptr, chart_, nullptr};
 };
 
 TEST_F(BaseTemplateTest, StylesGoIntoOneContainerUnderFreshIdsAndExistingOnesAreReused) {
-    GrxStyle& own = chart_.vis->addStyle();
+    GrxStyle& own = chart_.addStyle();
     own.setId(u"titleStyle");
-    GrrUviza& g = graph();
-    g.setId(u"main");
-    Probe probe(nullptr, *chart_.vis, nullptr);
-    EXPECT_EQ(&probe.addStyle(*chart_.vis, u"titleStyle"), &own);
-    EXPECT_EQ(chart_.vis->getStyleById(u"c-o-n-t-a-i-n-er"), nullptr)
-        << "nothing added for an existing style";
-    GrxStyle& first = probe.addStyle(*chart_.vis, u"");
-    GrxStyle& second = probe.addStyle(*chart_.vis, nullptr);
-    GrxStyle& third = probe.addStyle(*chart_.vis, u"main"); // held by a graph, which keeps it
-    EXPECT_EQ(ChartString(first.getId()).toUTF8() + " " + ChartString(second.getId()).toUTF8() + " " +
-                  ChartString(third.getId()).toUTF8(),
-              "style1 style2 main1");
-    EXPECT_EQ(chart_.vis->getElementById(u"main"), g.getImplementation());
-    GrxStyle* container = chart_.vis->getStyleById(u"c-o-n-t-a-i-n-er");
+    g_.setId(u"main");
+    EXPECT_EQ(&probe_.addStyle(chart_, u"titleStyle"), &own);
+    EXPECT_EQ(chart_.getStyleById(u"c-o-n-t-a-i-n-er"), nullptr) << "nothing added for an existing style";
+    GrxStyle& first = probe_.addStyle(chart_, u"");
+    GrxStyle& second = probe_.addStyle(chart_, nullptr);
+    GrxStyle& third = probe_.addStyle(chart_, u"main"); // held by a graph, which keeps it
+    EXPECT_EQ(u8(first.getId()) + " " + u8(second.getId()) + " " + u8(third.getId()), "style1 style2 main1");
+    EXPECT_EQ(chart_.getElementById(u"main"), g_.getImplementation());
+    GrxStyle* container = chart_.getStyleById(u"c-o-n-t-a-i-n-er");
     ASSERT_NE(container, nullptr);
     EXPECT_EQ(container->getStyles().size(), 3u);
     EXPECT_EQ(first.getImplementation()->getParentNode(), container->getImplementation());
-    EXPECT_EQ(chart_.vis->getStyles().size(), 2u); // the own style and the container
+    EXPECT_EQ(chart_.getStyles().size(), 2u); // the own style and the container
 }
 
 TEST_F(BaseTemplateTest, GraphsAreSelectedByNumberAndAllCounted) {
-    GrrUviza& a = graph();
-    GrrUviza& b = graph();
-    GrrUviza& c = chart_.vis->addContainer().addGraph(); // deeper graphs count too
+    GrrUviza& b = chart_.addGraph();
+    GrrUviza& c = chart_.addContainer().addGraph(); // deeper graphs count too
     const struct {
         const DOMElement* instruction;
         std::vector<GrrUviza*> picked;
     } cases[] = {{instruction({{u"graph", u"2"}}), {&b}},
-                 {instruction({}), {&a, &b, &c}},
+                 {instruction({}), {&g_, &b, &c}},
                  {instruction({{u"graph", u"7"}}), {}},
-                 {nullptr, {&a, &b, &c}}};
+                 {nullptr, {&g_, &b, &c}}};
     for (const auto& row : cases) {
         std::vector<GrrUviza*> picked;
-        EXPECT_EQ(Probe(nullptr, *chart_.vis, row.instruction).getGraphs(picked), 3u);
+        EXPECT_EQ(Probe(nullptr, chart_, row.instruction).getGraphs(picked), 3u);
         EXPECT_EQ(picked, row.picked);
     }
 }
 
 TEST_F(BaseTemplateTest, DimensionRolesCountReferencesButReturnOnlyDimensions) {
-    GrrUviza& g = graph();
-    GrxCoordinates& first = g.addCoordinates();
+    GrxCoordinates& first = g_.addCoordinates();
     GrxDimension& x = first.addDimension();
     GrxDimension& y = first.addDimension();
-    Probe probe(nullptr, *chart_.vis, nullptr);
-    EXPECT_TRUE(probe.getDimensionsByRole(g, ChartString("y2")).empty());
-    GrxCoordinates& second = g.addCoordinates();
+    EXPECT_TRUE(probe_.getDimensionsByRole(g_, ChartString("y2")).empty());
+    GrxCoordinates& second = g_.addCoordinates();
     second.addDimensionReference().setDimension(x); // takes the first place
     GrxDimension& y2 = second.addDimension();
     GrxDimension& z = second.addDimension();
-    const std::pair<const char*, GrxDimension*> roles[] = {{"x", &x}, {"y", &y}, {"y2", &y2}, {"z", &z}};
+    const std::pair<const char*, GrxDimension*> roles[] = {
+        {"x", &x}, {"y", &y}, {"y2", &y2}, {"z", &z}, {"w", nullptr}};
     for (const auto& [role, dimension] : roles)
-        EXPECT_EQ(probe.getDimensionsByRole(g, ChartString(role)), std::vector<GrxDimension*>{dimension})
+        EXPECT_EQ(probe_.getDimensionsByRole(g_, ChartString(role)),
+                  dimension ? std::vector<GrxDimension*>{dimension} : std::vector<GrxDimension*>{})
             << role;
-    EXPECT_TRUE(probe.getDimensionsByRole(g, ChartString("w")).empty());
 }
 
 TEST_F(BaseTemplateTest, QuestionsAboutAGraph) {
-    GrrUviza& g = graph();
-    GrxCoordinates& coordinates = g.addCoordinates();
+    GrxCoordinates& coordinates = g_.addCoordinates();
     GrxDimension& x = coordinates.addDimension();
     coordinates.addDimension();
-    Probe probe(nullptr, *chart_.vis, nullptr);
-    EXPECT_FALSE(probe.isGraphPolar(g));
-    EXPECT_FALSE(probe.isGraphClustered(g));
+    EXPECT_FALSE(probe_.isGraphPolar(g_) || probe_.isGraphClustered(g_));
     coordinates.addPolarTransform();
-    EXPECT_TRUE(probe.isGraphPolar(g));
-    x.setClusterVariable(chart_.vis->addSourceVariable());
-    EXPECT_TRUE(probe.isGraphClustered(g));
+    EXPECT_TRUE(probe_.isGraphPolar(g_));
+    x.setClusterVariable(chart_.addSourceVariable());
+    EXPECT_TRUE(probe_.isGraphClustered(g_));
 
-    probe.addZDimension(g);
-    probe.addZDimension(g); // three already: nothing more
+    probe_.addZDimension(g_);
+    probe_.addZDimension(g_); // three already: nothing more
     ASSERT_EQ(coordinates.getDimensions().size(), 3u);
     coordinates.getDimensions()[2]->addAxis();
-    GrxPoint& point = g.addPoint();
-    EXPECT_FALSE(probe.isChartTrue3D(g));
+    GrxPoint& point = g_.addPoint();
+    EXPECT_FALSE(probe_.isChartTrue3D(g_));
     point.addZ();
-    EXPECT_TRUE(probe.isChartTrue3D(g));
-}
+    EXPECT_TRUE(probe_.isChartTrue3D(g_));
 
-TEST_F(BaseTemplateTest, ElementsKindByKindAndRangesAndAxes) {
-    GrrUviza& g = graph();
-    GrxInterval& bar = g.addInterval();
-    GrxPoint& point = g.addPoint();
-    GrxLine& line = g.addLine();
-    std::vector<CTElementType*> all;
-    BaseTemplate::getAllElements(g, all);
-    EXPECT_EQ(all, (std::vector<CTElementType*>{&point, &line, &bar}));
-    std::vector<CTElementType*> lines;
-    Probe probe(nullptr, *chart_.vis, nullptr);
-    probe.getAllElementsByType(u"line", lines);
-    EXPECT_EQ(lines, (std::vector<CTElementType*>{&line}));
-
-    EXPECT_FALSE(probe.isIntervalRangeElement(bar));
-    bar.addSummaryStatistic().setMethod(7);
-    EXPECT_TRUE(probe.isIntervalRangeElement(bar));
-    point.addSummaryStatistic().setMethod(7);
-    EXPECT_FALSE(probe.isIntervalRangeElement(point));
-    EXPECT_EQ(probe.getElementsWithSummaryStatistics(g), std::vector<CTElementType*>{});
-    line.addSummaryStatistic().setMethod(4);
-    EXPECT_EQ(probe.getElementsWithSummaryStatistics(g), (std::vector<CTElementType*>{&line}));
-
-    GrxAxis& axis = g.addCoordinates().addDimension().addAxis();
-    EXPECT_FALSE(probe.isAxisDerived(axis));
-    axis.setTransform(0);
-    EXPECT_TRUE(probe.isAxisDerived(axis));
-}
-
-TEST_F(BaseTemplateTest, ScatterplotMatrixElementNeedsSlashesInBothExpressions) {
-    GrrUviza& g = graph();
-    GrxPoint& point = g.addPoint();
-    GrxExpressionVariable& ex = chart_.vis->addExpressionVariable();
-    GrxExpressionVariable& ey = chart_.vis->addExpressionVariable();
+    // A scatterplot matrix element needs slashes in both expressions.
+    GrxExpressionVariable& ex = chart_.addExpressionVariable();
+    GrxExpressionVariable& ey = chart_.addExpressionVariable();
     ex.setValue(u"a/b");
     ey.setValue(u"c");
     point.addX().setVariable(ex);
     point.addY().setVariable(ey);
-    Probe probe(nullptr, *chart_.vis, nullptr);
-    EXPECT_EQ(probe.getFirstSPLOMElement(g), nullptr);
+    EXPECT_EQ(probe_.getFirstSPLOMElement(g_), nullptr);
     ey.setValue(u"c/d");
-    EXPECT_EQ(probe.getFirstSPLOMElement(g), &point);
+    EXPECT_EQ(probe_.getFirstSPLOMElement(g_), &point);
 }
 
-TEST_F(BaseTemplateTest, BooleanAttributesAreExact) {
+TEST_F(BaseTemplateTest, ElementsKindByKindAndRangesAndAxes) {
+    GrxInterval& bar = g_.addInterval();
+    GrxPoint& point = g_.addPoint();
+    GrxLine& line = g_.addLine();
+    std::vector<CTElementType*> all, lines;
+    BaseTemplate::getAllElements(g_, all);
+    EXPECT_EQ(all, (std::vector<CTElementType*>{&point, &line, &bar}));
+    probe_.getAllElementsByType(u"line", lines);
+    EXPECT_EQ(lines, (std::vector<CTElementType*>{&line}));
+
+    EXPECT_FALSE(probe_.isIntervalRangeElement(bar));
+    bar.addSummaryStatistic().setMethod(7);
+    EXPECT_TRUE(probe_.isIntervalRangeElement(bar));
+    point.addSummaryStatistic().setMethod(7);
+    EXPECT_FALSE(probe_.isIntervalRangeElement(point));
+    EXPECT_EQ(probe_.getElementsWithSummaryStatistics(g_), std::vector<CTElementType*>{});
+    line.addSummaryStatistic().setMethod(4);
+    EXPECT_EQ(probe_.getElementsWithSummaryStatistics(g_), (std::vector<CTElementType*>{&line}));
+
+    GrxAxis& axis = g_.addCoordinates().addDimension().addAxis();
+    EXPECT_FALSE(probe_.isAxisDerived(axis));
+    axis.setTransform(0);
+    EXPECT_TRUE(probe_.isAxisDerived(axis));
+}
+
+TEST_F(BaseTemplateTest, BooleanAttributesAreExactAndCoordinatesMatchByPosition) {
     const DOMElement* e = instruction({{u"a", u"true"}, {u"b", u"false"}, {u"c", u"TRUE"}, {u"d", u""}});
-    EXPECT_TRUE(BaseTemplate::getBooleanAttribute(e, u"a", false));
-    EXPECT_FALSE(BaseTemplate::getBooleanAttribute(e, u"b", true));
-    EXPECT_TRUE(BaseTemplate::getBooleanAttribute(e, u"c", true));
-    EXPECT_FALSE(BaseTemplate::getBooleanAttribute(e, u"c", false));
-    EXPECT_TRUE(BaseTemplate::getBooleanAttribute(e, u"d", true));
-    EXPECT_FALSE(BaseTemplate::getBooleanAttribute(e, u"absent", false));
-    EXPECT_TRUE(BaseTemplate::getBooleanAttribute(nullptr, u"a", true));
-}
+    const struct {
+        const DOMElement* element;
+        const XMLCh* name;
+        bool absent, read;
+    } booleans[] = {{e, u"a", false, true},     {e, u"b", true, false}, {e, u"c", true, true},
+                    {e, u"c", false, false},    {e, u"d", true, true},  {e, u"absent", false, false},
+                    {nullptr, u"a", true, true}};
+    for (const auto& b : booleans)
+        EXPECT_EQ(BaseTemplate::getBooleanAttribute(b.element, b.name, b.absent), b.read)
+            << u8(b.name) << b.absent;
 
-TEST_F(BaseTemplateTest, CoordinatesMatchByPosition) {
-    GrrUviza& g = graph();
-    GrxCoordinates& first = g.addCoordinates();
-    GrxCoordinates& second = g.addCoordinates();
-    GrxPoint& own = g.addPoint();
-    const CTElementType& none = g.addLine();
+    GrxCoordinates& first = g_.addCoordinates();
+    GrxCoordinates& second = g_.addCoordinates();
+    GrxPoint& own = g_.addPoint();
+    const CTElementType& none = g_.addLine();
     own.setCoordinates(second);
-    const CTElementType& ownElement = own;
-    Probe probe(nullptr, *chart_.vis, nullptr);
-    EXPECT_TRUE(probe.doesCoordinateMatch(ownElement, ChartString("1")));
-    EXPECT_FALSE(probe.doesCoordinateMatch(ownElement, ChartString("0")));
-    EXPECT_FALSE(probe.doesCoordinateMatch(ownElement, ChartString("5")));
-    EXPECT_TRUE(probe.doesCoordinateMatch(none, ChartString("")));
-    EXPECT_FALSE(probe.doesCoordinateMatch(none, ChartString("1")));
-
     const GrxBaseElement& inSecond = second.addDimension();
     const GrxBaseElement& inFirst = first.addDimension();
-    EXPECT_TRUE(probe.doesCoordinateMatch(inSecond, ChartString("y2")));
-    EXPECT_FALSE(probe.doesCoordinateMatch(inSecond, ChartString("y")));
-    EXPECT_TRUE(probe.doesCoordinateMatch(inFirst, ChartString("y")));
-    EXPECT_FALSE(probe.doesCoordinateMatch(static_cast<const GrxBaseElement&>(g), ChartString("y")));
+    const struct {
+        const CTElementType* element;
+        const GrxBaseElement* other;
+        const char* coordinate;
+        bool matches;
+    } coordinates[] = {
+        {&own, nullptr, "1", true},       {&own, nullptr, "0", false},    {&own, nullptr, "5", false},
+        {&none, nullptr, "", true},       {&none, nullptr, "1", false},   {nullptr, &inSecond, "y2", true},
+        {nullptr, &inSecond, "y", false}, {nullptr, &inFirst, "y", true}, {nullptr, &g_, "y", false}};
+    for (const auto& c : coordinates)
+        EXPECT_EQ(c.element ? probe_.doesCoordinateMatch(*c.element, ChartString(c.coordinate))
+                            : probe_.doesCoordinateMatch(*c.other, ChartString(c.coordinate)),
+                  c.matches)
+            << c.coordinate;
 }
 
 TEST_F(BaseTemplateTest, VariablesOfAnElementAndTheirCopies) {
-    GrrUviza& g = graph();
-    GrxDimension& x = g.addCoordinates().addDimension();
-    GrxPoint& from = g.addPoint();
-    GrxPoint& to = g.addPoint();
-    GrxSourceVariable& vx = chart_.vis->addSourceVariable();
-    GrxSourceVariable& vy = chart_.vis->addSourceVariable();
+    GrxDimension& x = g_.addCoordinates().addDimension();
+    GrxPoint& from = g_.addPoint();
+    GrxPoint& to = g_.addPoint();
+    GrxSourceVariable& vx = chart_.addSourceVariable();
+    GrxSourceVariable& vy = chart_.addSourceVariable();
     from.addX().setVariable(vx);
     from.addY().setVariable(vy);
-    Probe probe(nullptr, *chart_.vis, instruction({}));
+    Probe probe(nullptr, chart_, instruction({}));
     EXPECT_EQ(probe.getElementVariable(from, ChartString("x")), &vx);
     EXPECT_EQ(probe.getElementVariable(from, ChartString("y")), &vy);
     EXPECT_EQ(probe.getElementVariable(from, ChartString("z")), nullptr);
-    GrxSourceVariable& cluster = chart_.vis->addSourceVariable();
+    GrxSourceVariable& cluster = chart_.addSourceVariable();
     x.setClusterVariable(cluster);
     EXPECT_EQ(probe.getElementVariable(from, ChartString("x")), &cluster);
 

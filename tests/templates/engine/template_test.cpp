@@ -1,37 +1,23 @@
-#include "support/EngineSupport.h"
-#include "support/TestSupport.h"
+// ChartTemplate and the instruction walk: loading a template, each built instruction reaching its
+// action, the tool's report, and what a failing action costs.
+#include "templates/TemplateSupport.h"
+
 #include "support/ToolRunner.h"
 
-#include "templates/InstructionWalk.h"
-#include "templates/actions/Actions.h"
-
 #include <plotaid/ChartErrorHandler.h>
-#include <plotaid/ChartTemplate.h>
 
 #include <kovar/KovarGoToCaller.h>
 
-#include <xercesc/dom/DOM.hpp>
 #include <xercesc/util/XMLException.hpp>
 
 #include <filesystem>
 #include <set>
 
+using namespace template_test;
 using namespace XERCES_CPP_NAMESPACE;
-using engine_test::Chart;
-using engine_test::EngineTest;
 using engine_test::Records;
-using plotaid::detail::InstructionOutcome;
-using plotaid::detail::WalkReport;
 
 namespace {
-
-std::string templateOf(const std::string& body) {
-    return "<?xml version=\"1.0\" encoding=\"UTF-8\"?>\n<template xmlns=\"http://plotaid.org/grxml\" "
-           "xmlns:xsi=\"http://www.w3.org/2001/XMLSchema-instance\" "
-           "xsi:schemaLocation=\"http://plotaid.org/grxml "
-           "http://plotaid.org/grxml/grxml-template-3.5.xsd\">" +
-           body + "</template>";
-}
 
 bool startsWith(const std::string& s, const std::string& prefix) {
     return s.compare(0, prefix.size(), prefix) == 0;
@@ -62,40 +48,37 @@ std::string label(const InstructionOutcome& o) {
                                                   : "unsupported";
 }
 
-using ChartTemplateLoading = EngineTest;
+using ChartTemplateLoading = TemplateTest;
 
 TEST_F(ChartTemplateLoading, UnparsableTemplateFailsOnceWithItsTextLogsWhereAndAppliesNothing) {
     Dumps dumps(nullptr);
-    Chart chart = Chart::parse(engine_test::example("charts/simple-bar.xml"));
-    ASSERT_TRUE(chart.vis);
-    const std::string before = chart.vis->AsUTF8();
+    GrxVisualization& chart = sample("simple-bar.xml");
+    const std::string before = chart.AsUTF8();
     const std::string text = templateOf("<setStyle>"); // not well-formed
     Records records;
-    ChartTemplate t(*chart.vis, nullptr);
+    ChartTemplate t(chart, nullptr);
     EXPECT_FALSE(t.setTemplate(text));
     const std::vector<std::string> errors = records.errors();
     EXPECT_EQ(std::count(errors.begin(), errors.end(), "Failed to parse template " + text), 1);
-    EXPECT_EQ(&t.applyTemplate(), chart.vis.get());
-    EXPECT_EQ(chart.vis->AsUTF8(), before);
+    EXPECT_EQ(&t.applyTemplate(), &chart);
+    EXPECT_EQ(chart.AsUTF8(), before);
     // Unknown tags pass the grammar (the walk reports them); a declaration inside an instruction does not.
     EXPECT_FALSE(t.setTemplate(templateOf("<setStyle><!ENTITY x \"y\"></setStyle>")));
     ASSERT_TRUE(t.setTemplate(templateOf("<setStyle type=\"interval\"/><madeUp/>")));
     t.applyTemplate();
     const std::string log = readAll(dumps.dir.file("chartxml_error.log"));
-    EXPECT_NE(log.find("Failed to parse template <?xml"), std::string::npos) << log;
-    EXPECT_NE(log.find("at file backend/chartxml/plotaid/src/templates/charttemplate, line 59"),
-              std::string::npos);
-    EXPECT_NE(log.find("Unsupported Template element encountered (<madeUp"), std::string::npos) << log;
-    EXPECT_NE(log.find("at file backend/chartxml/plotaid/src/templates/applytemplate, line 436"),
-              std::string::npos);
+    for (const char* line : {"Failed to parse template <?xml",
+                             "at file backend/chartxml/plotaid/src/templates/charttemplate, line 59",
+                             "Unsupported Template element encountered (<madeUp",
+                             "at file backend/chartxml/plotaid/src/templates/applytemplate, line 436"})
+        EXPECT_NE(log.find(line), std::string::npos) << line << "\n" << log;
 }
 
 TEST_F(ChartTemplateLoading, EarlierFormIsConvertedDumpedAndAppliesNothing) {
     Dumps dumps("0001");
-    Chart chart = Chart::parse(engine_test::example("charts/simple-bar.xml"));
-    ASSERT_TRUE(chart.vis);
-    const std::string before = chart.vis->AsUTF8();
-    ChartTemplate t(*chart.vis, nullptr);
+    GrxVisualization& chart = sample("simple-bar.xml");
+    const std::string before = chart.AsUTF8();
+    ChartTemplate t(chart, nullptr);
     // An old-form document that names the marker only in a comment is parsed as it is, and refused.
     EXPECT_FALSE(t.setTemplate("<?xml version=\"1.0\"?><!-- grxml-template- --><graph/>"));
     EXPECT_TRUE(filesStartingWith(dumps.dir, "template_converted_").empty());
@@ -105,34 +88,82 @@ TEST_F(ChartTemplateLoading, EarlierFormIsConvertedDumpedAndAppliesNothing) {
     EXPECT_TRUE(t.setTemplate("this is not XML"));
     t.applyTemplate();
     EXPECT_TRUE(report.outcomes().empty());
-    EXPECT_EQ(chart.vis->AsUTF8(), before);
+    EXPECT_EQ(chart.AsUTF8(), before);
     const std::vector<std::string> dumped = filesStartingWith(dumps.dir, "template_converted_");
     ASSERT_EQ(dumped.size(), 2u); // numbered by the process-wide converter count
     const std::string converted = readAll(dumped.front());
     EXPECT_NE(converted.find("grxml-template-1.0.xsd"), std::string::npos);
-    Chart other = Chart::empty();
-    EXPECT_TRUE(ChartTemplate(*other.vis, nullptr).setTemplate(converted)) << "itself a valid template";
+    EXPECT_TRUE(ChartTemplate(empty(), nullptr).setTemplate(converted)) << "itself a valid template";
 }
 
-TEST_F(ChartTemplateLoading, BundledTemplateReportsEveryInstructionAndTheToolPrintsIt) {
-    Chart chart = Chart::parse(engine_test::example("charts/simple-bar.xml"));
-    ASSERT_TRUE(chart.vis);
-    ChartTemplate t(*chart.vis, nullptr);
+TEST_F(ChartTemplateLoading, EachBuiltInstructionReachesItsActionInDocumentOrder) {
+    // A line with two colours, a dash and a size, a point with a shape, a pattern and three colours,
+    // and a label frame; "addDash" takes the second colours, "addImage" then the first.
+    GrxVisualization& chart = parse(chartOf(
+        "<sourceVariable id='var_a' categorical='1'/><sourceVariable id='var_b' categorical='0'/>"
+        "<styleCycle id='chartCycle'><cycle><style color='red'/></cycle></styleCycle><graph id='graph_1'>"
+        "<coordinates id='coordinates_1'><dimension id='dim_x'/><dimension id='dim_y'/></coordinates>"
+        "<line id='line_1' coordinates='coordinates_1'><color id='colour_1' variable='var_a' "
+        "cycle='chartCycle'/>"
+        "<color id='colour_2' variable='var_a' cycle='chartCycle'/><dash id='dash_1' variable='var_a' "
+        "cycle='chartCycle'/><size id='size_1' variable='var_b' low='1pt'/></line><point id='point_a' "
+        "coordinates='coordinates_1'><shape id='shape_a' variable='var_a' cycle='chartCycle'/><pattern "
+        "id='pattern_a' variable='var_a' cycle='chartCycle'/><color variable='var_a'/><color "
+        "variable='var_a'/>"
+        "<color id='colour_3' variable='var_a'/></point></graph><labelFrame id='frame_1'/>"));
     WalkReport report;
-    ASSERT_TRUE(t.setTemplate(engine_test::example("templates/bar-tidy.sgt")));
+    ChartTemplate t(chart, nullptr);
+    ASSERT_TRUE(t.setTemplate(
+        templateOf("<setStyle type='line'><style color='red'/></setStyle>"
+                   "<setStyle type='line'><style color='blue'/></setStyle>"
+                   "<setStyle id='noSuchStyle'><style color='red'/></setStyle>"
+                   "<setColor><cycle><style color='#101010'/></cycle></setColor>"
+                   "<setDash><cycle><style stroke-dasharray='4 2'/></cycle></setDash>"
+                   "<setPattern><cycle><style pattern='2'/></cycle></setPattern>"
+                   "<setShape><cycle><style symbol='diamond'/></cycle></setShape>"
+                   "<setSize><parameter name='small' value='3pt'/></setSize>"
+                   "<setGenericAttributes elementName='labelFrame' styleName='style' font-style='normal'/>"
+                   "<addDash aestheticNumber='2'><cycle><style stroke-dasharray='1 1'/></cycle></addDash>"
+                   "<addImage aestheticNumber='1'><cycle><style color='#303030'/></cycle></addImage>"
+                   "<setShowLineMarkers/>")));
+    t.applyTemplate();
+    std::string outcomes;
+    for (const InstructionOutcome& o : report.outcomes())
+        outcomes += o.tag + ":" + label(o) + " ";
+    EXPECT_EQ(outcomes, "setStyle:applied setStyle:applied setStyle:failed setColor:applied setDash:applied "
+                        "setPattern:applied setShape:applied setSize:applied setGenericAttributes:applied "
+                        "addDash:applied addImage:applied setShowLineMarkers:applied ");
+    // One visible effect per instruction; the later "setStyle" sees and overrides the earlier one.
+    EXPECT_EQ(attr(byId<GrxLine>(chart, "line_1")->getStyle(), "color"), "blue");
+    EXPECT_EQ(stylesOf(chart, "colour_3") + stylesOf(chart, "dash_1") + stylesOf(chart, "pattern_a") +
+                  stylesOf(chart, "shape_a"),
+              "[({color=#101010;})][({stroke-dasharray=4 2;})][({pattern=2;})][({symbol=diamond;})]");
+    EXPECT_EQ(byId<GrxSize>(chart, "size_1")->getLengthMappings().size(), 1u);
+    EXPECT_NE(byId<GrxLabelFrame>(chart, "frame_1")->getStyle(), nullptr);
+    EXPECT_NE(byId<GrxDash>(chart, "colour_2"), nullptr);
+    EXPECT_NE(byId<GrxImage>(chart, "colour_1"), nullptr);
+    EXPECT_EQ(chart.getGraphs().front()->getPoints().size(), 1u); // not a lone line
+
+    // With a source, what the chart's own definition sets stays; the rest the template may add.
+    GrxVisualization& target = sample("simple-bar.xml");
+    plotaid::detail::applyTemplateCommands(
+        &sample("simple-bar.xml"), target,
+        templateRoot("<setStyle type=\"bar\"><style color=\"red\" font-family=\"Serif\"/></setStyle>"));
+    EXPECT_EQ(attr(target.getStyleById(u"barStyle"), "color") + " " +
+                  attr(target.getStyleById(u"barStyle"), "font-family"),
+              "#3E58AC Serif");
+}
+
+TEST_F(ChartTemplateLoading, TheToolReportsEveryInstructionOfABundledTemplate) {
+    WalkReport report;
+    ChartTemplate t(sample("simple-bar.xml"), nullptr);
+    ASSERT_TRUE(t.setTemplate(example("templates/bar-tidy.sgt")));
     t.applyTemplate();
     ASSERT_EQ(report.outcomes().size(), 5u);
-    const plotaid::detail::InstructionTable table = plotaid::detail::instructionTable();
     std::vector<std::string> expected;
-    for (const InstructionOutcome& o : report.outcomes()) {
-        bool built = false;
-        for (std::size_t i = 0; i < table.count; ++i)
-            if (ChartString(table.entries[i].tag).toUTF8() == o.tag)
-                built = table.entries[i].make != nullptr;
-        EXPECT_EQ(o.kind == InstructionOutcome::Unsupported, !built) << o.tag;
+    for (const InstructionOutcome& o : report.outcomes())
         expected.push_back("bar-tidy.sgt #" + std::to_string(o.position) + " " + o.tag + ": " + label(o) +
                            "\n");
-    }
 
     TempDir dir;
     const std::string examples = std::string("'") + PLOTAID_EXAMPLES_DIR;
@@ -165,7 +196,7 @@ TEST_F(ChartTemplateLoading, BundledTemplateReportsEveryInstructionAndTheToolPri
     EXPECT_EQ(runTool("apply --help").exitCode, 0);
 }
 
-// ---- the walk --------------------------------------------------------------------------------------
+// ---- the walk, with test actions -----------------------------------------------------------------
 
 // What the test actions saw, in order: tag and the "steps" already on the target when it ran.
 std::vector<std::string>& journal() {
@@ -203,8 +234,7 @@ public:
             journal().push_back("frames:" + std::to_string(frames_->size()));
             frames_->push_back(&target_);
         } else if (tag() == "record") {
-            const GrxBaseElement& root = target_;
-            const std::string seen = ChartString(root.GetAttribute(u"steps")).toUTF8();
+            const std::string seen = u8(static_cast<const GrxBaseElement&>(target_).GetAttribute(u"steps"));
             journal().push_back("record@" + seen);
             target_.SetAttribute(u"steps", ChartString(seen + "x"));
         }
@@ -212,7 +242,7 @@ public:
     }
 
 private:
-    std::string tag() const { return ChartString(instruction_->getTagName()).toUTF8(); }
+    std::string tag() const { return u8(instruction_->getTagName()); }
     plotaid::detail::FrameList* frames_ = nullptr;
 };
 
@@ -225,37 +255,28 @@ const plotaid::detail::InstructionEntry kTestTable[] = {
     {u"anyFault", "", makeAction<Scripted>},          {u"later", "NotBuilt", nullptr},
 };
 
-class InstructionWalk : public EngineTest {
+class InstructionWalk : public TemplateTest {
 protected:
-    void SetUp() override {
-        journal().clear();
-        chart_ = Chart::empty();
-    }
-    // Parses a template body (the grammar accepts the test tags) and walks it with the test table.
+    void SetUp() override { journal().clear(); }
+    // Walks a template body (the grammar accepts the test tags) with the test table.
     void walk(const std::string& body) {
-        const DOMDocument* d =
-            parser_.parse(templateOf(body), "test", ChartException("test template", "t", 0));
-        ASSERT_NE(d, nullptr);
-        plotaid::detail::applyTemplateCommands(nullptr, *chart_.vis, d->getDocumentElement(),
+        plotaid::detail::applyTemplateCommands(nullptr, chart_, templateRoot(body),
                                                {kTestTable, std::size(kTestTable)});
     }
-    std::vector<std::string> kinds(const WalkReport& report) const {
-        std::vector<std::string> out;
+    std::string kinds(const WalkReport& report) const {
+        std::string out;
         for (const InstructionOutcome& o : report.outcomes())
-            out.push_back(label(o));
+            out += label(o) + " ";
         return out;
     }
-    Chart chart_;
-    plotaid::detail::ValidatingParser parser_;
+    GrxVisualization& chart_ = empty();
 };
 
 TEST_F(InstructionWalk, AppliesInDocumentOrderEachSeeingTheEarlierChanges) {
-    const std::string before = chart_.vis->AsUTF8();
+    const std::string before = chart_.AsUTF8();
     walk("");
-    EXPECT_EQ(chart_.vis->AsUTF8(), before);
-    plotaid::detail::applyTemplateCommands(nullptr, *chart_.vis, nullptr,
-                                           {kTestTable, std::size(kTestTable)});
-    EXPECT_EQ(chart_.vis->AsUTF8(), before);
+    plotaid::detail::applyTemplateCommands(nullptr, chart_, nullptr, {kTestTable, std::size(kTestTable)});
+    EXPECT_EQ(chart_.AsUTF8(), before);
     // The nested element belongs to its instruction and is never dispatched by itself.
     walk("\n  <!-- c --><record><record/></record>\n<?pi x?><record/>");
     EXPECT_EQ(journal(), (std::vector<std::string>{"record@", "record@x"}));
@@ -273,23 +294,24 @@ TEST_F(InstructionWalk, UnknownPrefixedAndUnbuiltTagsAreReportedAlikeAndSkipped)
     EXPECT_EQ(errors[0].back(), ')');
     EXPECT_TRUE(startsWith(errors[1], "Unsupported Template element encountered (<g:record"));
     EXPECT_TRUE(startsWith(errors[2], "Unsupported Template element encountered (<later"));
-    EXPECT_EQ(kinds(report),
-              (std::vector<std::string>{"applied", "unsupported", "unsupported", "unsupported", "applied"}));
+    EXPECT_EQ(kinds(report), "applied unsupported unsupported unsupported applied ");
     EXPECT_EQ(report.outcomes()[2].tag, "g:record");
     EXPECT_EQ(report.outcomes()[4].position, 5u);
 }
 
-TEST_F(InstructionWalk, AnActionsFailureCostsOnlyItsInstruction) {
+TEST_F(InstructionWalk, AnActionsFailureCostsOnlyItsInstructionAndFramesLiveForOneWalk) {
     Records records;
     WalkReport report;
     walk("<throw/><record/><quiet/><log/><xmlFault/><record/>");
-    EXPECT_EQ(journal(), (std::vector<std::string>{"record@", "record@x"}));
-    EXPECT_EQ(kinds(report),
-              (std::vector<std::string>{"failed", "applied", "failed", "failed", "failed", "applied"}));
+    EXPECT_EQ(kinds(report), "failed applied failed failed failed applied ");
     EXPECT_EQ(report.outcomes()[0].reason, "boom");
     EXPECT_EQ(report.outcomes()[3].reason, "no axis of that role"); // the error, not the warning
     // The thrown action was swallowed without a record; the XML fault was logged.
     EXPECT_EQ(records.errors().size(), 2u);
+    walk("<frames/><record/><frames/>");
+    walk("<frames/><frames/>");
+    EXPECT_EQ(journal(), (std::vector<std::string>{"record@", "record@x", "frames:0", "record@xx", "frames:1",
+                                                   "frames:0", "frames:1"}));
 }
 
 TEST_F(InstructionWalk, FaultsWhileMakingAnActionEndTheWalkAndTheHostsUnwindingPasses) {
@@ -309,19 +331,11 @@ TEST_F(InstructionWalk, FaultsWhileMakingAnActionEndTheWalkAndTheHostsUnwindingP
         EXPECT_EQ(e.code(), 7);
     }
     EXPECT_EQ(journal(), (std::vector<std::string>{"record@", "record@x", "record@xx"}));
-}
 
-TEST_F(InstructionWalk, FrameListLivesForOneWalk) {
-    walk("<frames/><record/><frames/>");
-    walk("<frames/><record/><frames/>");
-    EXPECT_EQ(journal(), (std::vector<std::string>{"frames:0", "record@", "frames:1", "frames:0", "record@x",
-                                                   "frames:1"}));
-}
-
-TEST_F(InstructionWalk, ChartTemplateReportsAFatalWalkAndPassesTheHostsUnwinding) {
+    // Through ChartTemplate the fatal walk is reported once more; nothing is rolled back.
     plotaid::detail::ScopedInstructionTable table({kTestTable, std::size(kTestTable)});
-    Records records;
-    ChartTemplate fatal(*chart_.vis, nullptr);
+    GrxVisualization& chart = empty();
+    ChartTemplate fatal(chart, nullptr);
     ASSERT_TRUE(fatal.setTemplate(templateOf("<record/><anyFault/><record/>")));
     try {
         fatal.applyTemplate();
@@ -331,29 +345,24 @@ TEST_F(InstructionWalk, ChartTemplateReportsAFatalWalkAndPassesTheHostsUnwinding
         EXPECT_EQ(e.line(), 102u);
     }
     EXPECT_EQ(records.errors().back(), "Fatal Error occurred while applying template");
-    // What the first instruction did stays: nothing is rolled back.
-    EXPECT_EQ(ChartString(chart_.base().GetAttribute(u"steps")).toUTF8(), "x");
-    ChartTemplate host(*chart_.vis, nullptr);
+    EXPECT_EQ(u8(static_cast<const GrxBaseElement&>(chart).GetAttribute(u"steps")), "x");
+    ChartTemplate host(chart, nullptr);
     ASSERT_TRUE(host.setTemplate(templateOf("<host/>")));
     EXPECT_THROW(host.applyTemplate(), KovarGoToCaller);
 }
 
-TEST(InstructionTable, AllFiftyNineTagsInOrderEachDeclaredByTheGrammar) {
+TEST(InstructionTable, FiftyNineDistinctTagsEachDeclaredByTheGrammar) {
     const plotaid::detail::InstructionTable table = plotaid::detail::instructionTable();
     ASSERT_EQ(table.count, 59u);
     const std::string grammar =
         readAll(std::string(PLOTAID_SOURCE_DIR) + "/resources/schemas/grxml-template-3.5.xsd");
     std::set<std::string> tags, classes;
     for (std::size_t i = 0; i < table.count; ++i) {
-        const std::string tag = ChartString(table.entries[i].tag).toUTF8();
+        const std::string tag = u8(table.entries[i].tag);
         EXPECT_TRUE(tags.insert(tag).second) << tag;
         EXPECT_TRUE(classes.insert(table.entries[i].actionClass).second) << table.entries[i].actionClass;
         EXPECT_NE(grammar.find("<xs:element name=\"" + tag + "\""), std::string::npos) << tag;
     }
-    EXPECT_EQ(ChartString(table.entries[0].tag).toUTF8(), "setStyle");
-    EXPECT_STREQ(table.entries[29].actionClass, "TAddPieEffects");
-    EXPECT_EQ(ChartString(table.entries[31].tag).toUTF8(), "addDrillDown");
-    EXPECT_EQ(ChartString(table.entries[58].tag).toUTF8(), "setGenericAttributes");
 }
 
 } // namespace

@@ -1,40 +1,21 @@
 // Template format elements onto the object model's formats.
-#include "support/EngineSupport.h"
+#include "templates/TemplateSupport.h"
 
-#include <plotaid/BaseTemplate.h>
-
-#include <xercesc/dom/DOM.hpp>
 #include <xercesc/framework/MemBufInputSource.hpp>
 #include <xercesc/parsers/XercesDOMParser.hpp>
 
 #include <cstdlib>
 #include <memory>
 #include <sstream>
-#include <string>
 
+using namespace template_test;
 using namespace XERCES_CPP_NAMESPACE;
-using engine_test::Chart;
-using engine_test::EngineTest;
 
 namespace {
 
-class Probe : public BaseTemplate {
-public:
-    using BaseTemplate::BaseTemplate;
-    bool apply() override { return false; }
-};
-
-std::string utf8(const XMLCh* s) {
-    return ChartString(s).toUTF8();
-}
-
-class FormatImport : public EngineTest {
+class FormatImport : public TemplateTest {
 protected:
-    void SetUp() override { fresh(); }
-    void fresh() {
-        chart_ = Chart::empty();
-        format_ = &chart_.vis->addSourceVariable().addFormat();
-    }
+    void fresh() { format_ = &chart_.addSourceVariable().addFormat(); }
 
     // Imports the template element through the operation its tag names; date and time parts
     // alone stand for a date-time format of them.
@@ -48,8 +29,8 @@ protected:
         parsers_.back()->parse(source);
         ASSERT_EQ(parsers_.back()->getErrorCount(), 0u) << body;
         const DOMElement* e = parsers_.back()->getDocument()->getDocumentElement()->getFirstElementChild();
-        const std::string tag = utf8(e->getLocalName());
-        Probe probe(nullptr, *chart_.vis, nullptr);
+        const std::string tag = u8(e->getLocalName());
+        Probe probe(nullptr, chart_, nullptr); // each kind through the operation its tag names
         if (tag == "numberFormat")
             probe.importNumberFormat(*format_, e);
         else if (tag == "stringFormat")
@@ -65,11 +46,9 @@ protected:
     // "name=value ..." written straight onto the format.
     void preset(const std::string& pairs) {
         std::istringstream in(pairs);
-        for (std::string pair; in >> pair;) {
-            const std::string::size_type eq = pair.find('=');
-            format_->SetAttribute(ChartString(pair.substr(0, eq)).xc_str(),
-                                  ChartString(pair.substr(eq + 1)).xc_str());
-        }
+        for (std::string pair; in >> pair;)
+            format_->SetAttribute(ChartString(pair.substr(0, pair.find('='))).xc_str(),
+                                  ChartString(pair.substr(pair.find('=') + 1)));
     }
 
     // The format's values of the names in `expected` ("name=value ...", "-" for absent), numbers
@@ -78,23 +57,18 @@ protected:
         std::istringstream in(expected);
         std::string out;
         for (std::string pair; in >> pair;) {
-            const std::string name = pair.substr(0, pair.find('='));
-            const XMLCh* raw = format_->GetAttribute(ChartString(name).xc_str());
-            std::string value = format_->isAttributePresent(ChartString(name).xc_str()) ? utf8(raw) : "-";
+            const std::string name = pair.substr(0, pair.find('=')), value = attr(format_, name);
             char* end = nullptr;
-            const double number = std::strtod(value.c_str(), &end);
-            if (!value.empty() && *end == '\0') {
-                std::ostringstream n;
-                n << number;
-                value = n.str();
-            }
-            out += (out.empty() ? "" : " ") + name + "=" + value;
+            std::ostringstream number;
+            number << std::strtod(value.c_str(), &end);
+            out += (out.empty() ? "" : " ") + name + "=" +
+                   (!value.empty() && *end == '\0' ? number.str() : value);
         }
         return out;
     }
 
-    Chart chart_;
-    GrxFormat* format_ = nullptr;
+    GrxVisualization& chart_ = empty();
+    GrxFormat* format_ = &chart_.addSourceVariable().addFormat();
     std::vector<std::unique_ptr<XercesDOMParser>> parsers_;
 };
 
@@ -132,8 +106,7 @@ TEST_F(FormatImport, EachFormatKindSetsWhatItNamesAndClearsWhatItMustOnly) {
          "<numberFormat minimumFractionDigits='0' minimumIntegerDigits='4' maximumIntegerDigits='7' "
          "scalingFactor='0.001'/>",
          "minimumFractionDigits=0 minimumIntegerDigits=4 maximumIntegerDigits=7 scalingFactor=0.001"},
-        // Affixes: an empty or absent one removes what the format had; the other kinds touch nothing
-        // else.
+        // Affixes: an empty or absent one removes what the format had; the other kinds touch nothing else.
         {"prefix=$ suffix=USD", "<numberFormat prefix='' suffix='EUR'/>", "prefix=- suffix=EUR"},
         {"useGrouping=true", "<stringFormat prefix='(' suffix=')'/>", "prefix=( suffix=) useGrouping=true"},
         {"prefix=( useGrouping=true", "<elapsedTimeFormat suffix='h'/>",
@@ -148,22 +121,23 @@ TEST_F(FormatImport, EachFormatKindSetsWhatItNamesAndClearsWhatItMustOnly) {
         {"baseFormat=3", "<dateTimeFormat><other/></dateTimeFormat>", "baseFormat=3"},
         // Only the first date format is read.
         {"",
-         "<dateFormat><year showCentury='true'/></dateFormat><timeFormat><minute/>"
-         "</timeFormat><dateFormat><month fill='true'/><era/></dateFormat>",
+         "<dateFormat><year "
+         "showCentury='true'/></dateFormat><timeFormat><minute/></timeFormat><dateFormat><month "
+         "fill='true'/><era/></dateFormat>",
          "baseFormat=3 showYear=true yearAbbreviation=false showMinute=true showMonth=- monthFormat=- "
          "showEra=-"},
         {"",
-         "<dateFormat><dayOfWeek long='true'/><dayOfMonth fill='true'/>"
-         "<week fill='false'/><month fill='true'/><quarter prefix='Q' suffix=''/>"
-         "<year showCentury='false'/><era/></dateFormat>",
+         "<dateFormat><dayOfWeek long='true'/><dayOfMonth fill='true'/><week fill='false'/><month "
+         "fill='true'/>"
+         "<quarter prefix='Q' suffix=''/><year showCentury='false'/><era/></dateFormat>",
          "showDayOfWeek=true dayOfWeekAbbreviation=false showDay=true dayType=1 dayPadding=true "
-         "showWeek=true "
-         "weekPadding=false showMonth=true monthFormat=4 showQuarter=true quarterPrefix=Q quarterSuffix=- "
-         "showYear=true yearAbbreviation=true showEra=true"},
+         "showWeek=true weekPadding=false "
+         "showMonth=true monthFormat=4 showQuarter=true quarterPrefix=Q quarterSuffix=- showYear=true "
+         "yearAbbreviation=true showEra=true"},
         // The day of the year wins over the day of the month; a month name over a month.
         {"dayPadding=true monthFormat=4",
-         "<dateFormat><dayOfYear fill='false'/><dayOfMonth/><monthName long='false'/>"
-         "<month fill='false'/><dayOfWeek long='false'/></dateFormat>",
+         "<dateFormat><dayOfYear fill='false'/><dayOfMonth/><monthName long='false'/><month "
+         "fill='false'/><dayOfWeek long='false'/></dateFormat>",
          "dayType=2 dayPadding=false monthFormat=1 dayOfWeekAbbreviation=true"},
         {"", "<dateFormat><monthName long='true'/></dateFormat>", "monthFormat=2"},
         // Parts not named stay; a fill other than true or false leaves the padding.
@@ -181,8 +155,8 @@ TEST_F(FormatImport, EachFormatKindSetsWhatItNamesAndClearsWhatItMustOnly) {
         {"hourFormat=2", "<timeFormat><hour showAMPM='false'/></timeFormat>", "hourFormat=2 showHour=true"},
         {"hourFormat=3", "<timeFormat><hour twentyFour='yes'/></timeFormat>", "hourFormat=3 showHour=true"},
         {"",
-         "<timeFormat><hour fill='true'/><minute fill='true'/>"
-         "<second fill='false' milliseconds='true'/></timeFormat>",
+         "<timeFormat><hour fill='true'/><minute fill='true'/><second fill='false' "
+         "milliseconds='true'/></timeFormat>",
          "hourPadding=true showMinute=true minutePadding=true showSecond=true secondPadding=false "
          "showMilliseconds=true hourFormat=-"},
         {"hourPadding=true showMilliseconds=true minutePadding=true",
@@ -200,7 +174,7 @@ TEST_F(FormatImport, EachFormatKindSetsWhatItNamesAndClearsWhatItMustOnly) {
 
 TEST_F(FormatImport, NullElementsChangeNothing) {
     preset("prefix=$ useGrouping=true");
-    Probe p(nullptr, *chart_.vis, nullptr);
+    Probe p(nullptr, chart_, nullptr);
     BaseTemplate::importFormat(*format_, nullptr);
     p.importNumberFormat(*format_, nullptr);
     p.importStringFormat(*format_, nullptr);
@@ -219,19 +193,19 @@ TEST_F(FormatImport, FormatReplacesEveryAttributeKeepsOneUnitRuleAndNoTakenId) {
     EXPECT_EQ(state("suffix=% maximumFractionDigits=1"), "suffix=% maximumFractionDigits=1");
     const std::vector<GrxUnitRule*> rules = format_->getUnitRules();
     ASSERT_EQ(rules.size(), 1u);
-    EXPECT_EQ(utf8(rules[0]->getSuffix()), "K");
+    EXPECT_EQ(u8(rules[0]->getSuffix()), "K");
     EXPECT_DOUBLE_EQ(rules[0]->getMin(), 1000.0);
     EXPECT_DOUBLE_EQ(rules[0]->getScale(), 0.001);
 
     // Without unit rules in the template the format keeps none; an id taken elsewhere stays there.
-    GrxSourceVariable& other = chart_.vis->addSourceVariable();
+    GrxSourceVariable& other = chart_.addSourceVariable();
     other.setId(u"taken");
     import("<format id='taken' prefix='#'/>");
     EXPECT_TRUE(format_->getUnitRules().empty());
     EXPECT_EQ(state("prefix=# suffix=- id=-"), "prefix=# suffix=- id=-");
-    EXPECT_EQ(chart_.vis->getElementById(u"taken"), other.getImplementation());
+    EXPECT_EQ(chart_.getElementById(u"taken"), other.getImplementation());
     import("<format id='fresh'/>");
-    EXPECT_EQ(chart_.vis->getElementById(u"fresh"), format_->getImplementation());
+    EXPECT_EQ(chart_.getElementById(u"fresh"), format_->getImplementation());
 }
 
 } // namespace

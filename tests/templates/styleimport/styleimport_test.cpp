@@ -1,41 +1,28 @@
-#include "StyleImportSupport.h"
-
-#include "support/TestSupport.h"
-
-#include <grx/GrxUni.h>
+// Template style declarations onto the chart's styles: where each property lands, the source
+// guard, and interpolation as smoothing statistics on the elements that use the style.
+#include "templates/TemplateSupport.h"
 
 #include <sstream>
 
-using namespace XERCES_CPP_NAMESPACE;
-using engine_test::Chart;
-using engine_test::EngineTest;
-using engine_test::Records;
-using styleimport_test::Probe;
-using styleimport_test::sample;
-using styleimport_test::utf8;
+using namespace template_test;
 
 namespace {
 
-// The attribute's text, "-" when absent.
-std::string attr(const GrxBaseElement& e, const std::string& name) {
-    const ChartString n(name);
-    return e.isAttributePresent(n.xc_str()) ? utf8(e.GetAttribute(n.xc_str())) : "-";
-}
-
-class StyleImport : public EngineTest {
+class StyleImport : public TemplateTest {
 protected:
+    // A template "style" element from its text.
+    const DOMElement* style(const std::string& xml) {
+        return instruction("<setStyle>" + xml + "</setStyle>")->getFirstElementChild();
+    }
     // Imports template style text into the style `id` of `target`, guarded by `source` if given.
-    GrxStyle* import(Chart& target, const XMLCh* id, const std::string& style, const Chart* source) {
-        GrxStyle* s = target.vis ? target.vis->getStyleById(id) : nullptr;
-        const DOMElement* e = elements_.make(style);
-        EXPECT_NE(s, nullptr) << utf8(id);
-        EXPECT_NE(e, nullptr) << style;
-        if (s && e)
-            Probe(source ? source->vis.get() : nullptr, *target.vis, nullptr).importStyle(e, *s);
+    GrxStyle* import(GrxVisualization& target, const XMLCh* id, const std::string& xml,
+                     const GrxVisualization* source) {
+        GrxStyle* s = target.getStyleById(id);
+        EXPECT_NE(s, nullptr) << u8(id);
+        if (s)
+            Probe(source, target, nullptr).importStyle(style(xml), *s);
         return s;
     }
-
-    styleimport_test::StyleElements elements_;
 };
 
 struct Row {
@@ -146,59 +133,51 @@ TEST_F(StyleImport, EachPropertyLandsWhereTheRulesSay) {
     for (const Row& row : kRows) {
         SCOPED_TRACE(std::string(row.chart) + " " + row.style + " " + row.xml);
         const ChartString id(row.style);
-        Chart chart = sample(row.chart);
-        Chart source = row.source ? sample(row.chart) : Chart();
+        GrxVisualization& chart = sample(row.chart);
+        GrxVisualization* source = row.source ? &sample(row.chart) : nullptr;
         if (*row.targetFirst)
             import(chart, id.xc_str(), row.targetFirst, nullptr);
         if (row.source && *row.source)
-            import(source, id.xc_str(), row.source, nullptr);
-        const GrxStyle* s = import(chart, id.xc_str(), row.xml, row.source ? &source : nullptr);
-        ASSERT_NE(s, nullptr);
+            import(*source, id.xc_str(), row.source, nullptr);
+        const GrxStyle* s = import(chart, id.xc_str(), row.xml, source);
         std::istringstream expect(row.expect);
-        std::string pair;
-        while (std::getline(expect, pair, '|')) {
-            const std::string::size_type eq = pair.find('=');
-            EXPECT_EQ(attr(*s, pair.substr(0, eq)), pair.substr(eq + 1)) << pair;
-        }
+        for (std::string pair; std::getline(expect, pair, '|');)
+            EXPECT_EQ(attr(s, pair.substr(0, pair.find('='))), pair.substr(pair.find('=') + 1)) << pair;
     }
 }
 
 TEST_F(StyleImport, TheSourceGuardFollowsTheStylesIdNotItsPlace) {
-    const Chart source = sample("line-series.xml");
-    Chart chart = sample("line-series.xml");
+    const GrxVisualization& source = sample("line-series.xml");
+    GrxVisualization& chart = sample("line-series.xml");
     // The source knows no style "style1": a style a template added is free.
-    Probe(nullptr, *chart.vis, nullptr).addStyle(*chart.vis, nullptr).setColor(u"black");
-    EXPECT_EQ(attr(*import(chart, u"style1", R"(<style value="color:red"/>)", &source), "color"), "red");
+    Probe(nullptr, chart, nullptr).addStyle(chart, nullptr).setColor(u"black");
+    EXPECT_EQ(attr(import(chart, u"style1", R"(<style value="color:red"/>)", &source), "color"), "red");
     // An id that the source gives to something other than a style guards nothing.
-    Chart graphOnly = Chart::empty();
-    graphOnly.vis->addGraph().setId(u"shared");
-    GrxStyle& shared = chart.vis->addStyle();
+    GrxVisualization& graphOnly = empty();
+    graphOnly.addGraph().setId(u"shared");
+    GrxStyle& shared = chart.addStyle();
     shared.setId(u"shared");
     shared.setColor(u"black");
-    EXPECT_EQ(attr(*import(chart, u"shared", R"(<style value="color:red"/>)", &graphOnly), "color"), "red");
+    EXPECT_EQ(attr(import(chart, u"shared", R"(<style value="color:red"/>)", &graphOnly), "color"), "red");
 }
 
 TEST_F(StyleImport, AStyleWithoutIdCountsAsFilledWhenTheChartHasAnyFilledStyle) {
-    const DOMElement* e = elements_.make(R"(<style value="stroke:red;fill:blue"/>)");
-    ASSERT_NE(e, nullptr);
-    Chart chart = sample("line-series.xml");
-    GrxStyle& anonymous = chart.vis->addStyle();
-    Probe(nullptr, *chart.vis, nullptr).importStyle(e, anonymous);
-    EXPECT_EQ(attr(anonymous, "color"), "blue");
-    EXPECT_EQ(attr(anonymous, "color2"), "red");
-
-    Chart bare = Chart::empty(); // no style anywhere: nothing is filled
-    GrxStyle& lone = bare.vis->addStyle();
-    Probe(nullptr, *bare.vis, nullptr).importStyle(e, lone);
-    EXPECT_EQ(attr(lone, "color"), "red");
-    EXPECT_EQ(attr(lone, "color2"), "-");
+    const DOMElement* e = style(R"(<style value="stroke:red;fill:blue"/>)");
+    GrxVisualization& chart = sample("line-series.xml");
+    GrxStyle& anonymous = chart.addStyle();
+    Probe(nullptr, chart, nullptr).importStyle(e, anonymous);
+    EXPECT_EQ(attr(&anonymous, "color") + " " + attr(&anonymous, "color2"), "blue red");
+    GrxVisualization& bare = empty(); // no style anywhere: nothing is filled
+    GrxStyle& lone = bare.addStyle();
+    Probe(nullptr, bare, nullptr).importStyle(e, lone);
+    EXPECT_EQ(attr(&lone, "color") + " " + attr(&lone, "color2"), "red -");
 }
 
 TEST_F(StyleImport, AnUnsupportedChildIsReportedAndTheRestStillApplies) {
     TempDir logs;
     ScopedEnv log("DumpChartXMLPath", logs.path());
-    Chart chart = sample("scatter.xml");
-    Records records;
+    GrxVisualization& chart = sample("scatter.xml");
+    engine_test::Records records;
     GrxStyle* s =
         import(chart, u"legendStyle", R"(<style><bogus a="1"/><glyph sides="6"/></style>)", nullptr);
     EXPECT_EQ(s->getGlyph_sides(), 6);
@@ -223,19 +202,117 @@ TEST_F(StyleImport, ImportingTwiceGivesTheSameChartAsOnce) {
     for (const bool withSource : {false, true}) {
         for (const char* name : {"line-series.xml", "boxplot.xml"}) {
             SCOPED_TRACE(std::string(name) + (withSource ? " with source" : ""));
-            const Chart source = sample(name);
-            Chart once = sample(name);
-            Chart twice = sample(name);
-            for (const char16_t* id : {u"lineStyle", u"hingeStyle", u"visualizationStyle"}) {
-                if (!once.vis->getStyleById(id))
-                    continue;
-                for (int i = 0; i < 3; ++i)
+            const GrxVisualization& source = sample(name);
+            GrxVisualization& once = sample(name);
+            GrxVisualization& twice = sample(name);
+            for (const char16_t* id : {u"lineStyle", u"hingeStyle", u"visualizationStyle"})
+                for (int i = 0; once.getStyleById(id) && i < 3; ++i)
                     import(i ? twice : once, id, style, withSource ? &source : nullptr);
-            }
-            EXPECT_NE(once.vis->AsUTF8(), source.vis->AsUTF8());
-            EXPECT_EQ(twice.vis->AsUTF8(), once.vis->AsUTF8());
+            EXPECT_NE(once.AsUTF8(), source.AsUTF8());
+            EXPECT_EQ(twice.AsUTF8(), once.AsUTF8());
         }
     }
+}
+
+// ---- interpolation -------------------------------------------------------------------------------
+
+// A graph with two lines (one of style "lineStyle", one of "otherLine"), an area of "areaStyle"
+// and a path without a style; every element has an id.
+GrxVisualization& linesAreasAndPaths(GrxVisualization& vis) {
+    vis.addStyle().setId(u"c-o-n-t-a-i-n-er");
+    GrrUviza& graph = vis.addGraph();
+    const auto styled = [&](CTElementType& e, const char16_t* id, const char16_t* style) {
+        e.setId(id);
+        vis.addStyle().setId(style);
+        e.setStyle(*vis.getStyleById(style));
+    };
+    styled(graph.addLine(), u"line_a", u"lineStyle");
+    styled(graph.addLine(), u"line_b", u"otherLine");
+    styled(graph.addArea(), u"area_a", u"areaStyle");
+    graph.addPath().setId(u"path_a");
+    return vis;
+}
+
+class Interpolation : public StyleImport {
+protected:
+    void import(const char16_t* styleId, const std::string& interpolation,
+                const GrxVisualization* source = nullptr) {
+        StyleImport::import(chart_, styleId, "<style>" + interpolation + "</style>", source);
+    }
+    CTElementType& element(const char16_t* id) { return *byId<CTElementType>(chart_, u8(id)); }
+    // The smoothing method of the element's first smooth statistic; -1 when it has none.
+    int method(const char16_t* id) {
+        const std::vector<GrxSmoothStatistic*> smooths = element(id).getSmoothStatistics();
+        return smooths.empty() ? -1 : smooths.front()->getMethod();
+    }
+    GrxVisualization& chart_ = linesAreasAndPaths(empty());
+};
+
+TEST_F(Interpolation, MatchingLinesAndEveryAreaAndPathShareOneStatisticOfTheChosenMethod) {
+    import(u"lineStyle", R"(<interpolation type="step" pointPosition="right"/>)");
+    EXPECT_EQ(method(u"line_a"), 14);
+    EXPECT_EQ(method(u"line_b"), -1);
+    EXPECT_EQ(method(u"area_a"), 14);
+    EXPECT_EQ(method(u"path_a"), 14);
+    EXPECT_FALSE(element(u"line_b").isShowDiscontinuityPresent());
+    // The container style matches every line.
+    import(u"c-o-n-t-a-i-n-er", R"(<interpolation type="step" pointPosition="left"/>)");
+    EXPECT_EQ(method(u"line_b"), 13);
+    const struct {
+        const char* interpolation;
+        int method;
+        bool discontinuity;
+    } rows[] = {{R"(<interpolation type="jump" pointPosition="left"/>)", 13, true},
+                {R"(<interpolation type="step"/>)", 15, false},
+                {R"(<interpolation type="jump" pointPosition="right"/>)", 14, true},
+                {R"(<interpolation type="straight" pointPosition="left"/>)", 0, false}};
+    for (const auto& row : rows) {
+        import(u"lineStyle", row.interpolation);
+        EXPECT_EQ(method(u"line_a"), row.method) << row.interpolation;
+        EXPECT_EQ(element(u"line_a").getShowDiscontinuity(), row.discontinuity) << row.interpolation;
+    }
+    EXPECT_EQ(element(u"area_a").getSmoothStatistics().size(), 1u);
+    // Written so that it reads back.
+    const auto* line = byId<CTElementType>(parse(chart_.AsUTF8()), "line_a");
+    ASSERT_NE(line, nullptr);
+    ASSERT_EQ(line->getSmoothStatistics().size(), 1u);
+    EXPECT_EQ(line->getSmoothStatistics().front()->getMethod(), 0);
+}
+
+TEST_F(Interpolation, WithoutATypeNothingIsSmoothedButElementsGetStyles) {
+    import(u"lineStyle", R"(<interpolation pointPosition="left"/>)");
+    for (const char16_t* id : {u"line_a", u"area_a", u"path_a"})
+        EXPECT_EQ(method(id), -1) << u8(id);
+    // The path had no style; it has one of the template's now, inside the container.
+    GrxStyle* added = element(u"path_a").getStyle();
+    ASSERT_NE(added, nullptr);
+    EXPECT_EQ(u8(added->getId()), "style1");
+    EXPECT_EQ(added->getImplementation()->getParentNode(),
+              chart_.getStyleById(u"c-o-n-t-a-i-n-er")->getImplementation());
+    import(u"lineStyle", R"(<interpolation/>)");
+    EXPECT_EQ(element(u"path_a").getStyle(), added);
+}
+
+TEST_F(Interpolation, MissingValuesOnlyWhereTheSourceHoldsTheElementWithNoBreakRepresentation) {
+    // No source, a source without the element, or one with a representation of its own: nothing.
+    const GrxVisualization& own = linesAreasAndPaths(empty());
+    byId<CTElementType>(own, "line_a")->setBreakRepresentation(2);
+    const GrxVisualization* sources[] = {nullptr, &empty(), &own};
+    for (const GrxVisualization* source : sources) {
+        import(u"lineStyle", R"(<interpolation missingRepresentation="gap"/>)", source);
+        EXPECT_FALSE(element(u"line_a").isBreakRepresentationPresent());
+    }
+    const GrxVisualization& source = linesAreasAndPaths(empty());
+    import(u"lineStyle", R"(<interpolation missingRepresentation="wings"/>)", &source);
+    EXPECT_EQ(u8(element(u"line_a").GetAttribute(u"breakRepresentation")), "wings");
+    EXPECT_FALSE(element(u"line_b").isBreakRepresentationPresent()); // not matching
+    EXPECT_FALSE(element(u"area_a").isBreakRepresentationPresent());
+    import(u"c-o-n-t-a-i-n-er", R"(<interpolation missingRepresentation="interpolated"/>)", &source);
+    for (const char16_t* id : {u"line_a", u"line_b", u"area_a"})
+        EXPECT_EQ(element(id).getBreakRepresentation(), 2) << u8(id);
+    import(u"lineStyle", R"(<interpolation missingRepresentation="gap"/>)", &source);
+    import(u"lineStyle", R"(<interpolation missingRepresentation="dots"/>)", &source);
+    EXPECT_EQ(element(u"line_a").getBreakRepresentation(), 1);
 }
 
 } // namespace
