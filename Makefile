@@ -18,7 +18,9 @@ deps:
 $(BUILD)/build.ninja:
 	cmake -S . -B $(BUILD) -G Ninja $(CMAKE_FLAGS)
 
+# Flags given on the command line reach a build folder that is already configured, too.
 build: deps $(BUILD)/build.ninja
+	$(if $(CMAKE_FLAGS),cmake -S . -B $(BUILD) -G Ninja $(CMAKE_FLAGS) >/dev/null)
 	cmake --build $(BUILD) -j $(JOBS)
 
 test: build

@@ -16,6 +16,11 @@ xercesc::DOMDocument* newChartDocument();
 // for every element that carries a wrapper. Two equal signatures mean the same structure.
 std::string signature(const xercesc::DOMElement* root);
 
+// An attribute's text as UTF-8 ("" when absent).
+inline std::string attr(const GrxBaseElement& e, const XMLCh* name) {
+    return ChartString(e.GetAttribute(name)).toUTF8();
+}
+
 } // namespace grxtest
 
 #endif

@@ -1,5 +1,6 @@
 # Installs the build tree into a fresh prefix, then builds and runs a tiny host program against it,
-# once through find_package(plotaid CONFIG) and once through pkg-config.
+# once through find_package(plotaid CONFIG) and once through pkg-config. With MODE=subdirectory,
+# builds the host with the source tree added by add_subdirectory instead.
 file(REMOVE_RECURSE ${WORK_DIR})
 set(prefix ${WORK_DIR}/prefix)
 
@@ -11,7 +12,27 @@ function(run)
   set(LAST_OUTPUT "${out}" PARENT_SCOPE)
 endfunction()
 
+# add_subdirectory: the source tree inside a host's build, linked by the same target name.
+if(MODE STREQUAL "subdirectory")
+  run(${CMAKE_COMMAND} -S ${SOURCE_DIR}/tests/install/subdir -B ${WORK_DIR}/subdir-host -G Ninja
+      -DPLOTAID_SOURCE_DIR=${SOURCE_DIR} -DCMAKE_CXX_COMPILER_LAUNCHER=${LAUNCHER}
+      -DCMAKE_C_COMPILER_LAUNCHER=${LAUNCHER})
+  run(${CMAKE_COMMAND} --build ${WORK_DIR}/subdir-host --target host)
+  run(${WORK_DIR}/subdir-host/host)
+  if(NOT LAST_OUTPUT MATCHES "host ok")
+    message(FATAL_ERROR "add_subdirectory host printed: ${LAST_OUTPUT}")
+  endif()
+  return()
+endif()
+
 run(${CMAKE_COMMAND} --install ${BINARY_DIR} --prefix ${prefix})
+
+# The installed tool runs from the prefix on the installed shared library.
+run(${prefix}/bin/plotaid --help)
+execute_process(COMMAND ldd ${prefix}/bin/plotaid OUTPUT_VARIABLE linked)
+if(NOT linked MATCHES "libplotaid\\.so\\.1 => ${prefix}/")
+  message(FATAL_ERROR "the installed tool does not use the installed libplotaid:\n${linked}")
+endif()
 
 # find_package
 run(${CMAKE_COMMAND} -S ${SOURCE_DIR}/tests/install/host -B ${WORK_DIR}/cmake-host -G Ninja

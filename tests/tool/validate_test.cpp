@@ -24,6 +24,16 @@ std::string variant(const std::string& name, const std::string& from, const std:
     return writeScratch(name, text);
 }
 
+TEST(Tool, VersionHelpAndUnknownCommand) {
+    EXPECT_EQ(runTool("--version").exitCode, 0);
+    EXPECT_TRUE(has(runTool("--version"), "plotaid "));
+    EXPECT_EQ(runTool("--help").exitCode, 0);
+    EXPECT_TRUE(has(runTool("--help"), "usage: plotaid"));
+    EXPECT_EQ(runTool("").exitCode, 2);
+    EXPECT_EQ(runTool("frobnicate").exitCode, 2);
+    EXPECT_TRUE(has(runTool("frobnicate"), "unknown command 'frobnicate'"));
+}
+
 TEST(ToolValidate, EachFileGetsALineAndAnyFaultFailsTheRun) {
     useSourceGrammars();
     const std::string root = "<?xml version=\"1.0\"?><ROOT xmlns=\"http://plotaid.org/grxml\" "

@@ -1,6 +1,7 @@
 #include <grx/GrxDocument.h>
 #include <grx/GrxModel.h>
 
+#include "ModelClasses.h"
 #include "Names.h"
 
 #include <xercesc/dom/DOMAttr.hpp>
@@ -18,7 +19,6 @@ struct GrxDocument::Registry {
     std::unordered_map<std::u16string_view, Maker> makers;
 
     template <class T> void add(const XMLCh* name = T::getElementName()) { makers.emplace(name, &make<T>); }
-    template <class... T> void addAll() { (add<T>(), ...); }
     Maker find(const XMLCh* name) const {
         auto it = makers.find(std::u16string_view(name));
         return it == makers.end() ? nullptr : it->second;
@@ -32,33 +32,11 @@ struct GrxDocument::Arena {
 const GrxDocument::Registry& GrxDocument::registry() {
     static const Registry r = [] {
         Registry reg;
-        reg.addAll<GrxStyle, GrxLocation, CTTextType, GrxDescription, GrxDescriptionGroup, GrxLabel,
-                   GrxRelabel, GrxUnitRule, GrxFormat, GrxAggregation, GrxExtensionSV, GrxSourceVariable,
-                   GrxExpressionVariable, GrxDerivedVariable, GrxRange, GrxIntervalDomain,
-                   GrxVariableReference, GrxCategoryOrder, GrxSortMove, GrxSimpleSort, GrxStatisticSort,
-                   GrxCategories, GrxCategoricalDomain, GrxCycle, GrxStyleCycleExtension, GrxStyleCycle>();
-        reg.addAll<GrxSummaryStatistic, GrxBinStatistic, GrxSmoothStatistic, GrxRegionStatistic,
-                   GrxDistributionStatistic, GrxLinkStatistic, GrxCollectRowsStatistic, GrxAggregateStatistic,
-                   GrxClusteringStatistic, GrxGraphLayoutStatistic, GrxMapStatistic, GrxTagCloudStatistic,
-                   GrxTreeLayoutStatistic, GrxFixedWindowDensityStatistic, GrxNearestNeighborDensityStatistic,
-                   GrxTukeyStatistic, GrxSelfOrganizingMapStatistic, GrxPatternLinkStatistic>();
-        reg.addAll<GrxColorMapping, GrxDoubleMapping, GrxDashMapping, GrxIntegerMapping, GrxSymbolMapping,
-                   GrxLengthMapping, GrxScale, GrxStyleBy, GrxDash, GrxShape, GrxSize, GrxRotation, GrxColor,
-                   GrxOffset, GrxPattern, GrxTransparency, GrxSplit, GrxColorComponent, GrxVisibility,
-                   GrxImage, GrxLabeling, GrxConditionalStyle>();
-        reg.add<CTCoordinate>(GrxUni::_x);
-        reg.add<CTCoordinate>(GrxUni::_y);
-        reg.add<CTCoordinate>(GrxUni::_z);
-        reg.addAll<GrxPoint, GrxLine, GrxArea, GrxInterval, GrxPath, GrxEdge, GrxPolygon, GrxSchema,
-                   GrxPointGuide, GrxLineGuide, GrxFunctionGuide, GrxRectangleGuide, GrxPlaneGuide,
-                   GrxFrameGuide, GrxGridline, GrxMajorTicks, GrxMinorTicks, GrxAxisTransformParameter,
-                   GrxAxis, GrxDimension, GrxDimensionReference, GrxPolarTransform, GrxTransposeTransform,
-                   GrxReflectionTransform, GrxInsetTransform, GrxRectangularTransform, GrxObliqueTransform,
-                   GrxParallelCoordinatesTransform, GrxCoordinates, GrxFacetLevel, GrxTableLayout,
-                   GrxFacetLayout, GrxFaceting, GrrUviza>();
-        reg.addAll<GrxLabelFrame, GrxLegendTarget, GrxLegend, GrxControlFrame, GrxKey, GrxContainer,
-                   GrxExtensionVis, GrxTokenMapping, GrxPopup, GrxUserSource, GrxDatabaseSource,
-                   GrxDelimitedFileSource, GrxStreamingSource, GrxEmbeddedSource>();
+#define GRX_REGISTER(Class) reg.add<Class>();
+#define GRX_REGISTER_NAMED(Class, name) reg.add<Class>(name);
+        GRX_MODEL_CLASSES(GRX_REGISTER, GRX_REGISTER_NAMED)
+#undef GRX_REGISTER
+#undef GRX_REGISTER_NAMED
         return reg;
     }();
     return r;

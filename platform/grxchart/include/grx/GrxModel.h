@@ -69,7 +69,7 @@ class GRX_API GrxStyle : public GrxBaseElement {
     GRX_INT(Glyph_sides, GrxUni::_glyph_sides, 0)
     GRX_DOUBLE(Glyph_angle, GrxUni::_glyph_angle, 0.0)
     GRX_DOUBLE(Glyph_aspect, GrxUni::_glyph_aspect, 1.0)
-    GRX_ENUM(FontWeight, GrxUni::_font_weight, grx::kFontWeight, 0)
+    GRX_ENUM(FontWeight, GrxUni::_font_weight, grx::kFontWeight, 0) // 0: not given
     GRX_INT(LabelLocationHorizontal, GrxUni::_labelLocationHorizontal, 0)
     GRX_INT(LabelLocationVertical, GrxUni::_labelLocationVertical, 0)
     GRX_INT(LabelInside, GrxUni::_labelInside, 0)
@@ -121,16 +121,21 @@ private:
 class GRX_API GrxLocation : public GrxBaseElement {
     GRX_ELEMENT(GrxBaseElement, GrxUni::_location)
     enum ENUM_part {
-        part_left = 0,
-        part_right = 1,
-        part_top = 2,
-        part_bottom = 3,
-        part_width = 4,
-        part_height = 5
+        part_left = grx::LocationPart::left,
+        part_right = grx::LocationPart::right,
+        part_top = grx::LocationPart::top,
+        part_bottom = grx::LocationPart::bottom,
+        part_width = grx::LocationPart::width,
+        part_height = grx::LocationPart::height
     };
-    enum ENUM_method { method_fixed = 0, method_content = 1, method_sameEdge = 2, method_nextTo = 3 };
-    GRX_ENUM(Part, u"part", grx::kLocationPart, 0)
-    GRX_ENUM(Method, GrxUni::_method, grx::kLocationMethod, 0)
+    enum ENUM_method {
+        method_fixed = grx::LocationMethod::fixed,
+        method_content = grx::LocationMethod::content,
+        method_sameEdge = grx::LocationMethod::sameEdge,
+        method_nextTo = grx::LocationMethod::nextTo
+    };
+    GRX_ENUM(Part, u"part", grx::kLocationPart, grx::LocationPart::left)
+    GRX_ENUM(Method, GrxUni::_method, grx::kLocationMethod, grx::LocationMethod::fixed)
     GRX_TEXT(Value, GrxUni::_value)
     GRX_TEXT(Max, GrxUni::_max)
     GRX_REF(Target, GrxUni::_target, GrxBaseElement)
@@ -454,8 +459,8 @@ class GRX_API GrxBinStatistic : public CTStatisticType {
     GRX_TEXT(BinStart, _binStart)
     GRX_TEXT(BinWidth, _binWidth)
     GRX_TEXT(BinCount, _binCount)
-    GRX_ENUM(GridType, GrxUni::_gridType, grx::kGridType, 0)
-    GRX_ENUM(Location, GrxUni::_location, grx::kBinLocation, 0)
+    GRX_ENUM(GridType, GrxUni::_gridType, grx::kGridType, grx::GridType::hex)
+    GRX_ENUM(Location, GrxUni::_location, grx::kBinLocation, grx::BinLocation::grid)
 
 protected:
     MethodWords methodWords() const override { return {grx::kBinMethod, std::size(grx::kBinMethod)}; }
@@ -466,7 +471,7 @@ class GRX_API GrxSmoothStatistic : public CTStatisticType {
     GRX_INT(Degree, GrxUni::_degree, 0)
     GRX_BOOL(Bounded, u"bounded", true)
     GRX_DOUBLE(Proportion, GrxUni::_proportion, 0.0)
-    GRX_ENUM(Kernel, GrxUni::_kernel, grx::kKernel, 0)
+    GRX_ENUM(Kernel, GrxUni::_kernel, grx::kKernel, grx::Kernel::uniform)
     GRX_TEXT(Bandwidth, u"bandwidth")
     GRX_BOOL(Intercept, u"intercept", true)
     GRX_BOOL(Spikes, GrxUni::_spikes, false)
@@ -482,7 +487,7 @@ class GRX_API GrxRegionStatistic : public CTStatisticType {
 
 class GRX_API GrxDistributionStatistic : public CTStatisticType {
     GRX_ELEMENT(CTStatisticType, u"distributionStatistic")
-    GRX_ENUM(Distribution, GrxUni::_distribution, grx::kDistribution, 0)
+    GRX_ENUM(Distribution, GrxUni::_distribution, grx::kDistribution, 0) // 0: not given
     GRX_TEXT(Parameter, GrxUni::_parameter)
     GRX_TEXT(SecondaryParameter, u"secondaryParameter")
 };
@@ -490,9 +495,9 @@ class GRX_API GrxDistributionStatistic : public CTStatisticType {
 class GRX_API GrxLinkStatistic : public CTStatisticType {
     GRX_ELEMENT(CTStatisticType, u"linkStatistic")
     GRX_INT(Type, GrxUni::_type, 0)
-    GRX_ENUM(XReference, GrxUni::_x, grx::kLinkReference, 0)
-    GRX_ENUM(YReference, GrxUni::_y, grx::kLinkReference, 0)
-    GRX_ENUM(ZReference, GrxUni::_z, grx::kLinkReference, 0)
+    GRX_ENUM(XReference, GrxUni::_x, grx::kLinkReference, grx::LinkReference::none)
+    GRX_ENUM(YReference, GrxUni::_y, grx::kLinkReference, grx::LinkReference::none)
+    GRX_ENUM(ZReference, GrxUni::_z, grx::kLinkReference, grx::LinkReference::none)
 };
 
 // Statistics the library only tests for.
@@ -542,7 +547,7 @@ class GRX_API GrxScale : public GrxBaseElement {
     static constexpr XMLCh _UTF_method_atanh[] = u"atanh";
     static constexpr XMLCh _UTF_method_prob[] = u"prob";
     static constexpr XMLCh _UTF_method_cLoglog[] = u"cLoglog";
-    GRX_ENUM(Method, GrxUni::_method, grx::kScaleMethod, 1)
+    GRX_ENUM(Method, GrxUni::_method, grx::kScaleMethod, grx::ScaleMethod::linear)
     GRX_TEXT(Origin, GrxUni::_origin)
     GRX_BOOL(Invert, GrxUni::_invert, false)
     GRX_DOUBLE(Base, GrxUni::_UTF_base, 10.0)
@@ -596,7 +601,7 @@ class GRX_API GrxRotation : public CTAesthetic {
 };
 class GRX_API GrxColor : public CTAesthetic {
     GRX_ELEMENT(CTAesthetic, GrxUni::_color)
-    GRX_ENUM(Affect, u"affect", grx::kAffect, 0)
+    GRX_ENUM(Affect, u"affect", grx::kAffect, grx::Affect::none)
 };
 class GRX_API GrxOffset : public CTAesthetic {
     GRX_ELEMENT(CTAesthetic, u"offset")
@@ -615,7 +620,7 @@ class GRX_API GrxColorComponent : public CTAesthetic {
     GRX_ELEMENT(CTAesthetic, GrxUni::_colorComponent)
     GRX_LOW_HIGH
     GRX_INT(Type, GrxUni::_type, 0)
-    GRX_ENUM(Affect, u"affect", grx::kAffect, 0)
+    GRX_ENUM(Affect, u"affect", grx::kAffect, grx::Affect::none)
 };
 class GRX_API GrxVisibility : public CTAesthetic {
     GRX_ELEMENT(CTAesthetic, u"visibility")
@@ -671,7 +676,7 @@ class GRX_API CTElementType : public GrxBaseElement {
     GRX_BOOL(ShowCollidingLabels, GrxUni::_showCollidingLabels, false)
     GRX_TEXT(Name, GrxUni::_name)
     GRX_BOOL(ShowDiscontinuity, u"showDiscontinuity", false)
-    GRX_ENUM(BreakRepresentation, u"breakRepresentation", grx::kBreakRepresentation, 0)
+    GRX_ENUM(BreakRepresentation, u"breakRepresentation", grx::kBreakRepresentation, grx::BreakRepresentation::none)
 
     CTCoordinate* getX() const { return first<CTCoordinate>(GrxUni::_x); }
     CTCoordinate* getY() const { return first<CTCoordinate>(GrxUni::_y); }
@@ -807,11 +812,11 @@ class GRX_API GrxGridline : public GrxBaseElement {
 
 class GRX_API GrxMajorTicks : public GrxBaseElement {
     GRX_ELEMENT(GrxBaseElement, GrxUni::_majorTicks)
-    GRX_ENUM(Position, GrxUni::_position, grx::kTickPosition, 0)
+    GRX_ENUM(Position, GrxUni::_position, grx::kTickPosition, grx::TickPosition::inside)
     GRX_TEXT(Length, GrxUni::_length)
     GRX_TEXT(Stagger, GrxUni::_stagger)
     GRX_DOUBLE(Delta, GrxUni::_delta, 0.0)
-    GRX_ENUM(DeltaUnit, u"deltaUnit", grx::kDeltaUnit, 0)
+    GRX_ENUM(DeltaUnit, u"deltaUnit", grx::kDeltaUnit, grx::DeltaUnit::second)
     GRX_TEXT(Base, GrxUni::_UTF_base)
     GRX_DOUBLE(LabelAngle, GrxUni::_labelAngle, 0.0)
     GRX_INT(LabelFrequency, GrxUni::_labelFrequency, 1)
@@ -826,7 +831,7 @@ class GRX_API GrxMajorTicks : public GrxBaseElement {
 class GRX_API GrxMinorTicks : public GrxBaseElement {
     GRX_ELEMENT(GrxBaseElement, GrxUni::_minorTicks)
     GRX_INT(Number, GrxUni::_number, 2)
-    GRX_ENUM(Position, GrxUni::_position, grx::kTickPosition, 0)
+    GRX_ENUM(Position, GrxUni::_position, grx::kTickPosition, grx::TickPosition::inside)
     GRX_TEXT(Length, GrxUni::_length)
     GRX_REF(MarkStyle, GrxUni::_markStyle, GrxStyle)
     GRX_ONE(Gridline, GrxGridline)
@@ -843,8 +848,8 @@ class GRX_API GrxAxis : public GrxBaseElement {
     GRX_STYLED
     GRX_TEXT(Name, GrxUni::_name)
     GRX_LABELED
-    // 0 derived, 1 percent, 2 (also when absent) not derived.
-    GRX_ENUM(Transform, GrxUni::_transform, grx::kAxisTransform, 2)
+    // A plain axis (no transform attribute) is not derived.
+    GRX_ENUM(Transform, GrxUni::_transform, grx::kAxisTransform, grx::AxisTransform::none)
     GRX_BOOL(Opposite, GrxUni::_opposite, false)
     GRX_LIST(MajorTicks, GrxMajorTicks)
     GRX_LIST(MinorTicks, GrxMinorTicks)
@@ -1173,6 +1178,23 @@ public:
     std::string AsUTF8() const;
 };
 
+// The helpers that spell the classes above stay out of every file that includes this one.
 #undef GRX_FRAME_HOLDER
+#undef GRX_FRAME
+#undef GRX_STYLED
+#undef GRX_LABELED
+#undef GRX_LOW_HIGH
+#undef GRX_CONDITIONAL_STYLES
+#undef GRX_ELEMENT
+#undef GRX_KIND
+#undef GRX_LIST
+#undef GRX_ONE
+#undef GRX_PRESENCE
+#undef GRX_TEXT
+#undef GRX_BOOL
+#undef GRX_INT
+#undef GRX_DOUBLE
+#undef GRX_ENUM
+#undef GRX_REF
 
 #endif

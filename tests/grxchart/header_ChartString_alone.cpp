@@ -1,2 +1,0 @@
-// Compiles only if <grx/ChartString.h> brings everything it needs.
-#include <grx/ChartString.h>

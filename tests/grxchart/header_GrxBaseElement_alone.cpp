@@ -1,2 +1,0 @@
-// Compiles only if <grx/GrxBaseElement.h> brings everything it needs.
-#include <grx/GrxBaseElement.h>

@@ -1,2 +1,0 @@
-// Compiles only if <grx/GrxEnums.h> brings everything it needs.
-#include <grx/GrxEnums.h>

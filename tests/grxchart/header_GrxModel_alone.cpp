@@ -1,2 +1,0 @@
-// Compiles only if <grx/GrxModel.h> brings everything it needs.
-#include <grx/GrxModel.h>

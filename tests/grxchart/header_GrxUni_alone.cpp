@@ -1,2 +1,0 @@
-// Compiles only if <grx/GrxUni.h> brings everything it needs.
-#include <grx/GrxUni.h>

@@ -1,2 +1,0 @@
-// Compiles only if <grx/GrxVisualization.h> brings everything it needs.
-#include <grx/GrxVisualization.h>

@@ -1,2 +1,0 @@
-// Compiles only if <grx/formatter.h> brings everything it needs.
-#include <grx/formatter.h>

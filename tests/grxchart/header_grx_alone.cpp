@@ -1,2 +1,0 @@
-// Compiles only if <grx/grx.h> brings everything it needs.
-#include <grx/grx.h>

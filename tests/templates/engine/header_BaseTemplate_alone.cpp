@@ -1,2 +1,0 @@
-// Compiles only if <plotaid/BaseTemplate.h> brings everything it needs.
-#include <plotaid/BaseTemplate.h>

@@ -1,2 +1,0 @@
-// Compiles only if <plotaid/ChartStyleValue.h> brings everything it needs.
-#include <plotaid/ChartStyleValue.h>

@@ -1,2 +1,0 @@
-// Compiles only if <plotaid/ChartTransformer.h> brings everything it needs.
-#include <plotaid/ChartTransformer.h>

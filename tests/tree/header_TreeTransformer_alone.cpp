@@ -1,2 +1,0 @@
-// Compiles only if <plotaid/TreeTransformer.h> brings everything it needs.
-#include <plotaid/TreeTransformer.h>
