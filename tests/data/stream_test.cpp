@@ -115,7 +115,7 @@ TEST(DataStreamRoundTrip, NumbersStringsShortVariablesAndLongNames) {
     EXPECT_EQ(back.GetDataPointer("src", "b")[2], kMissing);
     EXPECT_EQ(back.GetRowCount("other"), 30001u);
     EXPECT_EQ(back.GetDataPointer("other", "c")[30000], 6);
-    EXPECT_EQ(back.GetCapacity("other"), 40000u); // 20000, doubled once
+    EXPECT_EQ(back.GetCapacity("other"), 32000u); // 1000, doubled as the cells arrived
     // Reference counts came back: freeing both references of "two" frees its slot.
     back.SetStringVariableValue("src", "a", 1, "p");
     back.SetStringVariableValue("src", "b", 1, "q");
@@ -198,6 +198,22 @@ TEST(DataStreamHostile, LyingCountsFailAndLeaveTheStoreEmpty) {
         EXPECT_FALSE(readInto(back, compressed(raw))) << lie.what;
         std::vector<std::string> names;
         EXPECT_EQ(back.GetSourceNames(names), 0) << lie.what;
+    }
+}
+
+TEST(DataStreamHostile, CountsThatWrapFailBeforeAnyMemoryIsTaken) {
+    // 2^31 variables of 2^30 - 36 rows: each block is 2^33 bytes, so their size wraps to 0.
+    std::string raw("\0\xB0\x01\0", 4);
+    appendU32(raw, {376, 1073741788u, 0x80000000u, 88});
+    appendField(raw, "src", 68);
+    appendField(raw, "v", 288);
+    for (const std::string& bytes : {compressed(raw), raw}) {
+        plotaid::detail::RecordCollector records;
+        VarDataProcessor back;
+        EXPECT_FALSE(readInto(back, bytes));
+        ASSERT_FALSE(records.records().empty());
+        EXPECT_NE(records.records().back().message.find("past the stream's end"), std::string::npos)
+            << records.records().back().message;
     }
 }
 
