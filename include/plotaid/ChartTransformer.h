@@ -69,15 +69,13 @@ private:
     const XERCES_CPP_NAMESPACE::DOMDocument* madeDataDocument();
     const std::string& compressedData();
 
-    struct DocumentRelease {
-        void operator()(XERCES_CPP_NAMESPACE::DOMDocument* document) const;
-    };
+    struct MadeData;
 
     std::unique_ptr<GrxVisualization> visualization_;
     // The sources taken from the chart (nodes of its document, out of its tree), so that the whole
     // document is put together without compressing, decompressing and parsing the data again.
     std::vector<XERCES_CPP_NAMESPACE::DOMElement*> sources_;
-    std::unique_ptr<XERCES_CPP_NAMESPACE::DOMDocument, DocumentRelease> madeData_;
+    std::unique_ptr<MadeData> madeData_;
     std::string data_;
     const unsigned char* dataStream_ = nullptr;
     unsigned int dataStreamLength_ = 0;

@@ -4,7 +4,9 @@
 #include <plotaid/Export.h>
 
 #include <map>
+#include <set>
 #include <string>
+#include <unordered_map>
 #include <vector>
 
 namespace plotaid::detail {
@@ -13,12 +15,12 @@ struct StoreAccess;
 
 // The in-memory store of chart data: named data sources of named variables, each variable a column
 // of doubles sharing its data source's capacity, with optional string values per row. Travels as
-// a compressed binary data stream (GetDataStream / ReadStreamData).
+// a compressed binary data stream (GetDataStream / ReadStreamData). Copies are deep.
 class PLOTAID_API VarDataProcessor {
 public:
     struct _column {
         unsigned rowCount = 0;
-        double* values = nullptr; // capacity cells; at and beyond rowCount the missing value
+        std::vector<double> values; // capacity cells; at and beyond rowCount the missing value
     };
     struct _sourcebag {
         unsigned capacity = 0;
@@ -93,11 +95,16 @@ private:
     bool SetString(StringMap& map, _column& column, const std::string& source, unsigned row,
                    const std::string& text);
     unsigned StringDataSize() const;
+    bool ReadStream(void* data, unsigned length);
+    void IndexStrings();
     static void SwapBytes(char* bytes, int count);
 
     std::map<std::string, _sourcebag> sources;
     std::map<std::string, std::map<std::string, StringMap>> stringMaps;
     std::vector<_stringentry> strings;
+    // The slot of every text in use, and the free slots (the lowest is taken first).
+    std::unordered_map<std::string, unsigned> stringIndex;
+    std::set<unsigned> freeStrings;
     bool byteOrderFlag = false;
 };
 

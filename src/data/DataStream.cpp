@@ -29,9 +29,10 @@
 #error "the data stream writes cells in memory order, which this build takes to be little-endian"
 #endif
 
+using plotaid::detail::guarded;
 using plotaid::detail::kMissingValue;
 using plotaid::detail::kVarDataFile;
-using plotaid::detail::reportDataError;
+using plotaid::detail::reportFailure;
 
 namespace {
 
@@ -348,9 +349,10 @@ void VarDataProcessor::SwapBytes(char* bytes, int count) {
 
 unsigned char* VarDataProcessor::GetDataStream(unsigned& length) {
     length = 0;
-    try {
+    unsigned char* const none = nullptr;
+    unsigned char* const built = guarded(kVarDataFile, __LINE__, "cannot build the data stream", none, [&]() -> unsigned char* {
         if (sources.size() > 0xFFFF) {
-            reportDataError("too many data sources for a data stream", kVarDataFile, __LINE__);
+            reportFailure("too many data sources for a data stream", kVarDataFile, __LINE__);
             return nullptr;
         }
         const auto count = static_cast<std::uint32_t>(sources.size());
@@ -364,13 +366,13 @@ unsigned char* VarDataProcessor::GetDataStream(unsigned& length) {
         const std::uint64_t stringSize = stringSectionSize(*this);
         total += stringSize;
         if (total > UINT_MAX) {
-            reportDataError("the data are too large for a data stream", kVarDataFile, __LINE__);
+            reportFailure("the data are too large for a data stream", kVarDataFile, __LINE__);
             return nullptr;
         }
 
         DeflateSink sink(total);
         if (!sink.ok()) {
-            reportDataError("cannot allocate the data stream", kVarDataFile, __LINE__);
+            reportFailure("cannot allocate the data stream", kVarDataFile, __LINE__);
             return nullptr;
         }
         unsigned char header[kHeaderSize] = {static_cast<unsigned char>(byteOrderFlag ? 1 : 0), kMark,
@@ -401,7 +403,7 @@ unsigned char* VarDataProcessor::GetDataStream(unsigned& length) {
                 sink.put(field.data(), field.size());
                 sink.zeros(kVariableField - field.size());
                 const std::uint32_t held = std::min(r, bag.capacity);
-                sink.put(column.values, std::size_t(held) * sizeof(double));
+                sink.put(column.values.data(), std::size_t(held) * sizeof(double));
                 for (std::uint32_t k = held; k < r; ++k)
                     sink.put(&kMissingValue, sizeof(double));
             }
@@ -436,14 +438,13 @@ unsigned char* VarDataProcessor::GetDataStream(unsigned& length) {
         unsigned char* out = sink.finish(length);
         if (!out) {
             length = 0;
-            reportDataError("cannot compress the data stream", kVarDataFile, __LINE__);
+            reportFailure("cannot compress the data stream", kVarDataFile, __LINE__);
         }
         return out;
-    } catch (...) {
+    });
+    if (built == nullptr)
         length = 0;
-        reportDataError("cannot build the data stream", kVarDataFile, __LINE__);
-        return nullptr;
-    }
+    return built;
 }
 
 namespace {
@@ -492,11 +493,13 @@ bool readStringSection(SectionReader& in, ParsedStrings& out) {
     std::uint32_t tableSize = 0;
     if (!in.u32(tableSize) || tableSize > in.remaining() / 8)
         return false;
-    out.table.resize(tableSize);
-    for (auto& entry : out.table) {
+    // Entries are taken as they arrive: the count alone justifies no memory.
+    for (std::uint32_t k = 0; k < tableSize; ++k) {
+        VarDataProcessor::_stringentry entry;
         std::uint32_t n = 0;
         if (!in.u32(entry.refCount) || !in.u32(n) || !in.text(entry.text, n))
             return false;
+        out.table.push_back(std::move(entry));
     }
     return in.remaining() == 0;
 }
@@ -505,10 +508,22 @@ bool readStringSection(SectionReader& in, ParsedStrings& out) {
 
 bool VarDataProcessor::ReadStreamData(void* data, unsigned length) {
     Reset();
-    try {
+    bool ended = false; // without an exception
+    const bool read = guarded(kVarDataFile, __LINE__, "cannot read the data stream", false, [&] {
+        const bool r = ReadStream(data, length);
+        ended = true;
+        return r;
+    });
+    if (!ended)
+        Reset();
+    return read;
+}
+
+bool VarDataProcessor::ReadStream(void* data, unsigned length) {
+    {
         const auto* bytes = static_cast<const unsigned char*>(data);
         if (!bytes || length < 2) {
-            reportDataError("empty data stream", kVarDataFile, __LINE__);
+            reportFailure("empty data stream", kVarDataFile, __LINE__);
             return false;
         }
         // A raw layout (what a writer sends when it could not compress) can never pass for a
@@ -528,7 +543,7 @@ bool VarDataProcessor::ReadStreamData(void* data, unsigned length) {
         }
         auto fail = [this](const char* why, unsigned line) {
             Reset();
-            reportDataError(std::string("bad data stream: ") + why, kVarDataFile, line);
+            reportFailure(std::string("bad data stream: ") + why, kVarDataFile, line);
             return false;
         };
 
@@ -558,18 +573,18 @@ bool VarDataProcessor::ReadStreamData(void* data, unsigned length) {
                 return fail("block offset out of place", __LINE__);
             const char* name = reinterpret_cast<const char*>(e + 12);
             t.name.assign(name, strnlen(name, kSourceNameMax));
-            expected += std::uint64_t(t.variables) * blockSize(t.rows);
-            if (expected > total)
+            // Divided rather than multiplied: V x (288 + 8R) can pass 2^64 and wrap.
+            if (t.variables > 0 && blockSize(t.rows) > (total - expected) / t.variables)
                 return fail("blocks reach past the stream's end", __LINE__);
+            expected += std::uint64_t(t.variables) * blockSize(t.rows);
         }
         table.clear();
         table.shrink_to_fit();
 
         for (const TableEntry& t : entries) {
-            AddDataSource(t.name, t.rows);
+            // The arrays grow with the cells that arrive, never ahead of them on the table's word.
+            AddDataSource(t.name, 0);
             _sourcebag& bag = sources[t.name];
-            if (t.variables > 0 && !ReallocBag(bag, t.rows))
-                return fail("cannot allocate the data", __LINE__);
             for (std::uint32_t v = 0; v < t.variables; ++v) {
                 char field[kVariableField];
                 if (!source->read(field, sizeof field))
@@ -580,11 +595,17 @@ bool VarDataProcessor::ReadStreamData(void* data, unsigned length) {
                 if (var == bag.variables.end())
                     return fail("cannot allocate the data", __LINE__);
                 _column& column = var->second;
-                if (!source->read(column.values, std::size_t(t.rows) * sizeof(double)))
-                    return fail("truncated cells", __LINE__);
+                for (std::uint32_t done = 0; done < t.rows;) {
+                    const std::uint32_t k = std::min<std::uint32_t>(t.rows - done, kStage / sizeof(double));
+                    if (!ReallocBag(bag, done + k))
+                        return fail("cannot allocate the data", __LINE__);
+                    if (!source->read(column.values.data() + done, std::size_t(k) * sizeof(double)))
+                        return fail("truncated cells", __LINE__);
+                    done += k;
+                }
                 if (swap) {
                     for (std::uint32_t r = 0; r < t.rows; ++r)
-                        SwapBytes(reinterpret_cast<char*>(column.values + r), sizeof(double));
+                        SwapBytes(reinterpret_cast<char*>(column.values.data() + r), sizeof(double));
                 }
                 column.rowCount = std::max(column.rowCount, t.rows);
             }
@@ -596,7 +617,7 @@ bool VarDataProcessor::ReadStreamData(void* data, unsigned length) {
             ParsedStrings parsed;
             stringsRead = readStringSection(in, parsed);
             if (!stringsRead) {
-                reportDataError("bad data stream: unreadable string section", kVarDataFile, __LINE__);
+                reportFailure("bad data stream: unreadable string section", kVarDataFile, __LINE__);
                 return false; // the numbers read so far stay
             }
             // Every variable keeps a string map; only maps of variables that exist are taken, and
@@ -619,7 +640,7 @@ bool VarDataProcessor::ReadStreamData(void* data, unsigned length) {
                             for (auto& [n, maps] : stringMaps)
                                 for (auto& [var, m] : maps)
                                     m.clear();
-                            reportDataError("bad data stream: string index out of range", kVarDataFile,
+                            reportFailure("bad data stream: string index out of range", kVarDataFile,
                                             __LINE__);
                             return false;
                         }
@@ -634,13 +655,10 @@ bool VarDataProcessor::ReadStreamData(void* data, unsigned length) {
                     std::string().swap(parsed.table[k].text);
             }
             strings = std::move(parsed.table);
+            IndexStrings();
         }
         if (!source->finish())
             return fail("the stream does not end where its length says", __LINE__);
         return stringsRead;
-    } catch (...) {
-        Reset();
-        reportDataError("cannot read the data stream", kVarDataFile, __LINE__);
-        return false;
     }
 }

@@ -14,61 +14,35 @@
 using plotaid::detail::grownCapacity;
 using plotaid::detail::kMissingValue;
 using plotaid::detail::kVarDataFile;
-using plotaid::detail::reportDataError;
+using plotaid::detail::reportFailure;
 
 namespace {
 
 constexpr unsigned kMinCapacity = 1000;
 constexpr unsigned kMaxInitialCapacity = 20000;
 
-double* newCells(std::size_t count) {
-    double* cells = new (std::nothrow) double[count];
-    if (!cells) {
-        reportDataError("cannot allocate " + std::to_string(count) + " data cells", kVarDataFile, __LINE__);
-        return nullptr;
+bool newCells(std::vector<double>& cells, std::size_t count) {
+    try {
+        cells.assign(count, kMissingValue);
+        return true;
+    } catch (const std::bad_alloc&) {
+        reportFailure("cannot allocate " + std::to_string(count) + " data cells", kVarDataFile, __LINE__);
+        return false;
     }
-    std::fill_n(cells, count, kMissingValue);
-    return cells;
 }
 
 } // namespace
 
 VarDataProcessor::VarDataProcessor() = default;
-
-VarDataProcessor::VarDataProcessor(const VarDataProcessor& other)
-    : stringMaps(other.stringMaps), strings(other.strings), byteOrderFlag(other.byteOrderFlag) {
-    // A copy owns copies of the arrays: two stores never share one.
-    try {
-        for (const auto& [name, bag] : other.sources) {
-            _sourcebag& mine = sources[name];
-            mine.capacity = bag.capacity;
-            for (const auto& [variable, column] : bag.variables) {
-                _column& copy = mine.variables[variable];
-                copy.values = new double[bag.capacity];
-                copy.rowCount = column.rowCount;
-                std::copy_n(column.values, bag.capacity, copy.values);
-            }
-        }
-    } catch (...) {
-        Reset();
-        throw;
-    }
-}
+VarDataProcessor::VarDataProcessor(const VarDataProcessor& other) = default;
+VarDataProcessor& VarDataProcessor::operator=(const VarDataProcessor& other) = default;
+VarDataProcessor::~VarDataProcessor() = default;
 
 VarDataProcessor::VarDataProcessor(VarDataProcessor&& other) noexcept
     : sources(std::move(other.sources)), stringMaps(std::move(other.stringMaps)),
-      strings(std::move(other.strings)), byteOrderFlag(other.byteOrderFlag) {
-    other.sources.clear();
-    other.stringMaps.clear();
-    other.strings.clear();
-}
-
-VarDataProcessor& VarDataProcessor::operator=(const VarDataProcessor& other) {
-    if (this != &other) {
-        VarDataProcessor copy(other);
-        *this = std::move(copy);
-    }
-    return *this;
+      strings(std::move(other.strings)), stringIndex(std::move(other.stringIndex)),
+      freeStrings(std::move(other.freeStrings)), byteOrderFlag(other.byteOrderFlag) {
+    other.Reset();
 }
 
 VarDataProcessor& VarDataProcessor::operator=(VarDataProcessor&& other) noexcept {
@@ -77,25 +51,19 @@ VarDataProcessor& VarDataProcessor::operator=(VarDataProcessor&& other) noexcept
         sources.swap(other.sources);
         stringMaps.swap(other.stringMaps);
         strings.swap(other.strings);
+        stringIndex.swap(other.stringIndex);
+        freeStrings.swap(other.freeStrings);
         byteOrderFlag = other.byteOrderFlag;
     }
     return *this;
 }
 
-VarDataProcessor::~VarDataProcessor() {
-    Reset();
-}
-
 void VarDataProcessor::Reset() {
-    for (auto& [name, bag] : sources) {
-        for (auto& [variable, column] : bag.variables) {
-            delete[] column.values;
-            column.values = nullptr;
-        }
-    }
     sources.clear();
     stringMaps.clear();
     strings.clear();
+    stringIndex.clear();
+    freeStrings.clear();
 }
 
 bool VarDataProcessor::AddDataSource(const std::string& source, unsigned initialRows) {
@@ -108,12 +76,12 @@ bool VarDataProcessor::AddDataSource(const std::string& source, unsigned initial
 }
 
 bool VarDataProcessor::AllocBag(_sourcebag& bag, const std::string& variable) {
-    double* cells = newCells(bag.capacity);
-    if (!cells)
+    std::vector<double> cells;
+    if (!newCells(cells, bag.capacity))
         return false;
     _column& column = bag.variables[variable];
     column.rowCount = 0;
-    column.values = cells;
+    column.values.swap(cells);
     return true;
 }
 
@@ -145,27 +113,44 @@ bool VarDataProcessor::RemoveString(unsigned index) {
     _stringentry& entry = strings[index];
     if (entry.refCount == 0)
         return false; // a free slot holds no reference to give back
-    if (--entry.refCount == 0)
+    if (--entry.refCount == 0) {
+        auto known = stringIndex.find(entry.text);
+        if (known != stringIndex.end() && known->second == index)
+            stringIndex.erase(known);
         std::string().swap(entry.text);
+        freeStrings.insert(index);
+    }
     return true;
 }
 
 int VarDataProcessor::AddString(const std::string& text) {
-    std::size_t freeSlot = strings.size();
-    for (std::size_t i = 0; i < strings.size(); ++i) {
-        _stringentry& entry = strings[i];
-        if (entry.text == text) {
-            ++entry.refCount;
-            return static_cast<int>(i);
-        }
-        if (entry.refCount == 0 && freeSlot == strings.size())
-            freeSlot = i;
+    auto known = stringIndex.find(text);
+    if (known != stringIndex.end()) {
+        ++strings[known->second].refCount;
+        return static_cast<int>(known->second);
     }
-    if (freeSlot == strings.size())
+    unsigned slot = static_cast<unsigned>(strings.size());
+    if (!freeStrings.empty()) {
+        slot = *freeStrings.begin();
+        freeStrings.erase(freeStrings.begin());
+    } else {
         strings.emplace_back();
-    strings[freeSlot].text = text;
-    strings[freeSlot].refCount = 1;
-    return static_cast<int>(freeSlot);
+    }
+    strings[slot].text = text;
+    strings[slot].refCount = 1;
+    stringIndex.emplace(text, slot);
+    return static_cast<int>(slot);
+}
+
+void VarDataProcessor::IndexStrings() {
+    stringIndex.clear();
+    freeStrings.clear();
+    for (unsigned i = 0; i < strings.size(); ++i) {
+        if (strings[i].refCount == 0)
+            freeStrings.insert(i);
+        else
+            stringIndex.emplace(strings[i].text, i); // a repeated text keeps its first slot
+    }
 }
 
 bool VarDataProcessor::DeleteColumn(const std::string& source, const std::string& variable) {
@@ -175,7 +160,6 @@ bool VarDataProcessor::DeleteColumn(const std::string& source, const std::string
     auto var = it->second.variables.find(variable);
     if (var == it->second.variables.end())
         return false;
-    delete[] var->second.values;
     it->second.variables.erase(var);
     auto maps = stringMaps.find(source);
     if (maps != stringMaps.end()) {
@@ -200,7 +184,8 @@ unsigned VarDataProcessor::DeleteRow(const std::string& source, unsigned row) {
     unsigned rows = 0;
     for (auto& [variable, column] : it->second.variables) {
         if (column.rowCount > row) {
-            std::copy(column.values + row + 1, column.values + column.rowCount, column.values + row);
+            std::copy(column.values.begin() + row + 1, column.values.begin() + column.rowCount,
+                      column.values.begin() + row);
             column.values[column.rowCount - 1] = kMissingValue;
             --column.rowCount;
             // The string values follow their rows, or each label would name its neighbour's value.
@@ -211,8 +196,8 @@ unsigned VarDataProcessor::DeleteRow(const std::string& source, unsigned row) {
                     map = &m->second;
             }
             if (map) {
-                auto at = map->find(row);
-                if (at != map->end()) {
+                auto at = map->lower_bound(row);
+                if (at != map->end() && at->first == row) {
                     if (at->second != NoString)
                         RemoveString(at->second);
                     at = map->erase(at);
@@ -235,23 +220,16 @@ bool VarDataProcessor::ReallocBag(_sourcebag& bag, unsigned rows) {
     if (capacity == bag.capacity)
         return true;
     // Allocate every array first so that a failure leaves all of them as they were.
-    std::vector<double*> grown;
-    grown.reserve(bag.variables.size());
-    for (auto& [variable, column] : bag.variables) {
-        double* cells = newCells(capacity);
-        if (!cells) {
-            for (double* p : grown)
-                delete[] p;
-            return false;
-        }
-        std::copy_n(column.values, bag.capacity, cells);
-        grown.push_back(cells);
-    }
+    std::vector<std::vector<double>> grown(bag.variables.size());
     std::size_t i = 0;
     for (auto& [variable, column] : bag.variables) {
-        delete[] column.values;
-        column.values = grown[i++];
+        if (!newCells(grown[i], capacity))
+            return false;
+        std::copy(column.values.begin(), column.values.end(), grown[i++].begin());
     }
+    i = 0;
+    for (auto& [variable, column] : bag.variables)
+        column.values.swap(grown[i++]);
     bag.capacity = capacity;
     return true;
 }
@@ -276,7 +254,7 @@ double* VarDataProcessor::SetMaxRow(const std::string& source, const std::string
         var = it->second.variables.find(variable);
     }
     var->second.rowCount = std::max(var->second.rowCount, rows);
-    return var->second.values;
+    return var->second.values.data();
 }
 
 bool VarDataProcessor::SetVariableValue(const std::string& source, const std::string& variable, unsigned row,
@@ -411,7 +389,7 @@ const double* VarDataProcessor::GetDataPointer(const std::string& source, const 
             return nullptr;
         var = it->second.variables.find(variable);
     }
-    return var->second.values;
+    return var->second.values.data();
 }
 
 std::string VarDataProcessor::GetValueAsString(const std::string& source, const std::string& variable,
@@ -461,7 +439,7 @@ bool VarDataProcessor::AddVDP(VarDataProcessor& other) {
                 complete = false;
                 break;
             }
-            if (!SetVariableValueRange(source, variable, column.values, 0, rows))
+            if (!SetVariableValueRange(source, variable, column.values.data(), 0, rows))
                 return false;
             const StringMap* map = noMap;
             if (otherMaps != other.stringMaps.end()) {

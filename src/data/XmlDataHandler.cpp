@@ -17,8 +17,9 @@
 #include <string_view>
 #include <unordered_map>
 
+using plotaid::detail::guarded;
 using plotaid::detail::kXmlDataFile;
-using plotaid::detail::reportDataError;
+using plotaid::detail::reportFailure;
 
 namespace {
 
@@ -35,9 +36,9 @@ constexpr std::string_view kHead = "<?xml version=\"1.0\" encoding=\"UTF-8\" sta
                                    "http://plotaid.org/grxml/data/grxml-data-2.1.xsd\">\n";
 constexpr std::string_view kTail = "</gs:graphSources>\n";
 
-constexpr std::string_view kSourceOpen = "<embeddedSource id=\"";
+constexpr std::string_view kSource = "embeddedSource";
 constexpr std::string_view kSourceClose = "</embeddedSource>";
-constexpr std::string_view kOldSourceOpen = "<source id=\"";
+constexpr std::string_view kOldSource = "source";
 constexpr std::string_view kOldSourceClose = "</source>";
 constexpr std::string_view kOldValueOpen = "<dataValue name=\"";
 constexpr std::string_view kRowOpen = "<row>";
@@ -65,6 +66,91 @@ unsigned countRows(std::string_view text, std::size_t from, std::size_t end) {
          at = findBefore(text, kRowOpen, at + kRowOpen.size(), end))
         ++rows;
     return rows;
+}
+
+bool isBlank(char c) {
+    return c == ' ' || c == '\t' || c == '\n' || c == '\r' || c == '\v' || c == '\f';
+}
+
+bool isNameChar(char c) {
+    return std::isalnum(static_cast<unsigned char>(c)) || c == '_' || c == '-' || c == '.' || c == ':' ||
+           static_cast<unsigned char>(c) >= 0x80;
+}
+
+std::size_t skipBlanks(std::string_view text, std::size_t i) {
+    while (i < text.size() && isBlank(text[i]))
+        ++i;
+    return i;
+}
+
+// The local name of the element tag whose name starts at text[at], and where the name ends.
+std::string_view tagName(std::string_view text, std::size_t at, std::size_t& end) {
+    end = at;
+    while (end < text.size() && isNameChar(text[end]))
+        ++end;
+    std::string_view name = text.substr(at, end - at);
+    const std::size_t colon = name.rfind(':');
+    return colon == npos ? name : name.substr(colon + 1);
+}
+
+// A data source's start tag, read as markup: any prefix, attribute order, quotes and spacing.
+struct SourceTag {
+    std::string id;
+    std::size_t content = npos; // just past the tag
+    bool empty = false;         // "<.../>": no rows
+};
+
+// The next start tag of the local name at or after from, stepping over comments, character data
+// sections, declarations, processing instructions and end tags; npos when there is none.
+std::size_t nextSourceTag(std::string_view text, std::size_t from, std::string_view local, SourceTag& tag) {
+    const std::size_t n = text.size();
+    for (std::size_t at = text.find('<', from); at != npos; at = text.find('<', at + 1)) {
+        const std::string_view rest = text.substr(at);
+        const std::string_view skipTo = rest.substr(0, 4) == "<!--"        ? "-->"
+                                        : rest.substr(0, 9) == "<![CDATA[" ? "]]>"
+                                        : rest.substr(0, 2) == "<?"        ? "?>"
+                                                                           : "";
+        if (!skipTo.empty()) {
+            at = text.find(skipTo, at + 2);
+            if (at == npos)
+                return npos;
+            continue;
+        }
+        std::size_t i = 0;
+        if (tagName(text, at + 1, i) != local || (i < n && !isBlank(text[i]) && text[i] != '>' && text[i] != '/'))
+            continue;
+        tag = SourceTag();
+        while ((i = skipBlanks(text, i)) < n && text[i] != '>' && text[i] != '/') {
+            std::size_t nameEnd = i;
+            const std::string_view attribute = tagName(text, i, nameEnd);
+            const bool isId = nameEnd - i == 2 && attribute == "id";
+            i = skipBlanks(text, nameEnd == i ? i + 1 : nameEnd);
+            if (i >= n || text[i] != '=')
+                continue;
+            i = skipBlanks(text, i + 1);
+            if (i >= n || (text[i] != '"' && text[i] != '\''))
+                continue;
+            const std::size_t close = std::min(text.find(text[i], i + 1), n);
+            if (isId)
+                tag.id = plotaid::detail::unescape(text.substr(i + 1, close - i - 1));
+            i = close + 1;
+        }
+        tag.empty = i < n && text[i] == '/';
+        tag.content = std::min(n, tag.empty ? i + 2 : i + 1);
+        return at;
+    }
+    return npos;
+}
+
+// Where the end tag of the local name starts, at or after from; the text's end when there is none.
+std::size_t sourceEnd(std::string_view text, std::size_t from, std::string_view local) {
+    for (std::size_t at = text.find("</", from); at != npos; at = text.find("</", at + 2)) {
+        std::size_t end = 0;
+        if (tagName(text, at + 2, end) == local && skipBlanks(text, end) < text.size() &&
+            text[skipBlanks(text, end)] == '>')
+            return at;
+    }
+    return text.size();
 }
 
 std::string extractName(std::string_view text, std::size_t from) {
@@ -116,10 +202,6 @@ std::size_t fieldEnd(std::string_view text, std::size_t start) {
         ++i;
     }
     return n;
-}
-
-bool isBlank(char c) {
-    return c == ' ' || c == '\t' || c == '\n' || c == '\r' || c == '\v' || c == '\f';
 }
 
 std::string_view trimmed(std::string_view field) {
@@ -189,26 +271,12 @@ private:
         return true;
     }
 
-    bool setString(Column* column, const std::string& variable, unsigned row, std::string text) {
-        auto& maps = Access::stringMaps(store_)[source_];
-        VarDataProcessor::StringMap& map = maps[variable];
-        auto& strings = Access::strings(store_);
+    bool setString(Column* column, const std::string& variable, unsigned row, const std::string& text) {
+        VarDataProcessor::StringMap& map = Access::stringMaps(store_)[source_][variable];
         auto at = map.find(row);
         if (at != map.end() && at->second != VarDataProcessor::NoString)
             Access::removeString(store_, at->second);
-        // The table's own look-up is a linear scan; a text of many strings needs a hash.
-        unsigned index = 0;
-        auto known = index_.find(text);
-        if (known != index_.end() && known->second < strings.size() && strings[known->second].refCount > 0 &&
-            strings[known->second].text == text) {
-            index = known->second;
-            ++strings[index].refCount;
-        } else {
-            index = static_cast<unsigned>(strings.size());
-            strings.push_back({text, 1});
-            index_[std::move(text)] = index;
-        }
-        map[row] = index;
+        map[row] = static_cast<unsigned>(Access::addString(store_, text));
         column->rowCount = std::max(column->rowCount, row + 1);
         return true;
     }
@@ -218,7 +286,6 @@ private:
     unsigned long long& budget_;
     Bag* bag_ = nullptr;
     bool failed_ = false;
-    std::unordered_map<std::string, unsigned> index_;
 };
 
 // Reads the fields of one row, up to the '<' that ends it (fields hold none: the writer escapes
@@ -295,14 +362,13 @@ std::vector<std::string> splitNames(std::string_view list) {
 // Reads every data source of either form into the store; false when the text costs more memory
 // than it can justify.
 bool fillStore(VarDataProcessor& store, std::string_view text, bool oldForm) {
-    const std::string_view open = oldForm ? kOldSourceOpen : kSourceOpen;
-    const std::string_view close = oldForm ? kOldSourceClose : kSourceClose;
+    const std::string_view local = oldForm ? kOldSource : kSource;
     unsigned long long budget = kAllocationFloor + kAllocationPerTextByte * text.size();
-    for (std::size_t at = text.find(open); at != npos; at = text.find(open, at + 1)) {
-        const std::string source = extractName(text, at + open.size());
-        std::size_t end = text.find(close, at);
-        if (end == npos)
-            end = text.size();
+    SourceTag tag;
+    for (std::size_t at = nextSourceTag(text, 0, local, tag); at != npos;
+         at = nextSourceTag(text, tag.content, local, tag)) {
+        const std::string& source = tag.id;
+        const std::size_t end = tag.empty ? tag.content : sourceEnd(text, tag.content, local);
         const unsigned rows = countRows(text, at, end);
         store.AddDataSource(source, rows);
         SourceFiller filler(store, source, budget);
@@ -357,10 +423,11 @@ void writeXmlData(VarDataProcessor& store, std::string& doc) {
         expected += 20ull * bag.variables.size() * store.GetRowCount(name) + 40 * bag.variables.size();
     doc.reserve(static_cast<std::size_t>(std::min<unsigned long long>(expected, 1ull << 30)));
 
+    bool whole = true;
     doc.append(kHead);
     for (const auto& [name, bag] : sources) {
         doc.append("\t<embeddedSource id=\"");
-        plotaid::detail::appendEscaped(doc, name, EscapeKind::SourceName);
+        whole &= plotaid::detail::appendEscaped(doc, name, EscapeKind::SourceName);
         doc.append("\">\n\t\t<names>");
         // Per variable: its cells and, walked in step with the rows, its string values.
         struct Walk {
@@ -374,8 +441,8 @@ void writeXmlData(VarDataProcessor& store, std::string& doc) {
             if (!first)
                 doc += ';';
             first = false;
-            plotaid::detail::appendEscaped(doc, variable, EscapeKind::VariableName);
-            Walk w{column.values, {}, {}};
+            whole &= plotaid::detail::appendEscaped(doc, variable, EscapeKind::VariableName);
+            Walk w{column.values.data(), {}, {}};
             if (maps != stringMaps.end()) {
                 auto m = maps->second.find(variable);
                 if (m != maps->second.end()) {
@@ -401,7 +468,7 @@ void writeXmlData(VarDataProcessor& store, std::string& doc) {
                 while (w.next != w.end && w.next->first < r)
                     ++w.next;
                 if (w.next != w.end && w.next->first == r && w.next->second < strings.size())
-                    plotaid::detail::appendEscaped(doc, strings[w.next->second].text, EscapeKind::Value);
+                    whole &= plotaid::detail::appendEscaped(doc, strings[w.next->second].text, EscapeKind::Value);
                 else
                     plotaid::detail::appendCell(doc, w.cells[r]);
             }
@@ -410,6 +477,9 @@ void writeXmlData(VarDataProcessor& store, std::string& doc) {
         doc.append("\t</embeddedSource>\n");
     }
     doc.append(kTail);
+    if (!whole)
+        reportFailure("the data hold control characters that XML cannot hold; each was written as '?'",
+                      kXmlDataFile, __LINE__);
 }
 
 bool readXmlData(VarDataProcessor& store, std::string_view xml) {
@@ -441,7 +511,7 @@ XmlDataHandler& XmlDataHandler::operator=(const XmlDataHandler& other) {
 XmlDataHandler::~XmlDataHandler() = default;
 
 bool XmlDataHandler::GetXmlData(std::string& out, bool compressed) {
-    try {
+    return guarded(kXmlDataFile, __LINE__, "cannot make the XML data", false, [&] {
         const std::string& text = *xmlText;
         if (text.empty()) {
             if (stream && streamLength > 0)
@@ -451,7 +521,7 @@ bool XmlDataHandler::GetXmlData(std::string& out, bool compressed) {
         if (compressed && !isCompressed(text)) {
             std::string packed;
             if (!zpack::compressString(text, packed)) {
-                reportDataError("cannot compress the XML data", kXmlDataFile, __LINE__);
+                reportFailure("cannot compress the XML data", kXmlDataFile, __LINE__);
                 return false;
             }
             out.swap(packed);
@@ -460,7 +530,7 @@ bool XmlDataHandler::GetXmlData(std::string& out, bool compressed) {
         if (!compressed && isCompressed(text)) {
             std::string plain;
             if (!zpack::decompressString(plain, text)) {
-                reportDataError("cannot decompress the XML data", kXmlDataFile, __LINE__);
+                reportFailure("cannot decompress the XML data", kXmlDataFile, __LINE__);
                 return false;
             }
             out.swap(plain);
@@ -468,22 +538,20 @@ bool XmlDataHandler::GetXmlData(std::string& out, bool compressed) {
         }
         out = text;
         return true;
-    } catch (...) {
-        reportDataError("cannot make the XML data", kXmlDataFile, __LINE__);
-        return false;
-    }
+    });
 }
 
 unsigned char* XmlDataHandler::GetDataStream(unsigned& length) {
     length = 0;
-    try {
+    unsigned char* const none = nullptr;
+    unsigned char* const made = guarded(kXmlDataFile, __LINE__, "cannot make the data stream", none, [&]() -> unsigned char* {
         const std::string& text = *xmlText;
         if (!text.empty()) {
             if (!isCompressed(text))
                 return BuildDataStream(text, length);
             std::string plain;
             if (!zpack::decompressString(plain, text)) {
-                reportDataError("cannot decompress the XML data", kXmlDataFile, __LINE__);
+                reportFailure("cannot decompress the XML data", kXmlDataFile, __LINE__);
                 return nullptr;
             }
             return BuildDataStream(plain, length);
@@ -495,11 +563,10 @@ unsigned char* XmlDataHandler::GetDataStream(unsigned& length) {
             return copy;
         }
         return nullptr;
-    } catch (...) {
+    });
+    if (made == nullptr)
         length = 0;
-        reportDataError("cannot make the data stream", kXmlDataFile, __LINE__);
-        return nullptr;
-    }
+    return made;
 }
 
 bool XmlDataHandler::BuildXmlData(std::string& out, bool compress) {
@@ -511,7 +578,7 @@ bool XmlDataHandler::BuildXmlData(std::string& out, bool compress) {
     doc.clear();
     plotaid::detail::writeXmlData(store, doc);
     if (compress && !zpack::compressString(work, out)) {
-        reportDataError("cannot compress the XML data", kXmlDataFile, __LINE__);
+        reportFailure("cannot compress the XML data", kXmlDataFile, __LINE__);
         return false;
     }
     return true;
@@ -521,11 +588,12 @@ unsigned char* XmlDataHandler::BuildDataStream(const std::string& xml, unsigned&
     length = 0;
     if (isOldForm(xml))
         return Build_1_4_DataStream(xml, length);
-    if (xml.find(kSourceOpen) == npos)
+    SourceTag tag;
+    if (nextSourceTag(xml, 0, kSource, tag) == npos)
         return nullptr;
     VarDataProcessor store;
     if (!plotaid::detail::readXmlData(store, xml)) {
-        reportDataError("the XML data claim more rows than their text holds", kXmlDataFile, __LINE__);
+        reportFailure("the XML data claim more rows than their text holds", kXmlDataFile, __LINE__);
         return nullptr;
     }
     return store.GetDataStream(length);
@@ -533,11 +601,12 @@ unsigned char* XmlDataHandler::BuildDataStream(const std::string& xml, unsigned&
 
 unsigned char* XmlDataHandler::Build_1_4_DataStream(const std::string& xml, unsigned& length) {
     length = 0;
-    if (xml.find(kOldSourceOpen) == npos)
+    SourceTag tag;
+    if (nextSourceTag(xml, 0, kOldSource, tag) == npos)
         return nullptr;
     VarDataProcessor store;
     if (!fillStore(store, xml, true)) {
-        reportDataError("the XML data claim more rows than their text holds", kXmlDataFile, __LINE__);
+        reportFailure("the XML data claim more rows than their text holds", kXmlDataFile, __LINE__);
         return nullptr;
     }
     return store.GetDataStream(length);

@@ -8,7 +8,8 @@
 
 namespace plotaid::detail {
 
-void appendEscaped(std::string& out, const std::string& text, EscapeKind kind) {
+bool appendEscaped(std::string& out, const std::string& text, EscapeKind kind) {
+    bool whole = true;
     const char* p = text.data();
     const char* const end = p + text.size();
     const char* plain = p; // start of the run not yet copied
@@ -37,6 +38,15 @@ void appendEscaped(std::string& out, const std::string& text, EscapeKind kind) {
         case '>':
             replacement = "&gt;";
             break;
+        case '\t':
+            replacement = "&#9;";
+            break;
+        case '\n':
+            replacement = "&#10;";
+            break;
+        case '\r':
+            replacement = "&#13;";
+            break;
         case ';':
             if (kind == EscapeKind::VariableName)
                 replacement = "&#59;";
@@ -44,6 +54,11 @@ void appendEscaped(std::string& out, const std::string& text, EscapeKind kind) {
                 replacement = ",";
             break;
         default:
+            // No form of XML 1.0, not even a character reference, can hold the other controls.
+            if (c < 0x20) {
+                replacement = "?";
+                whole = false;
+            }
             break;
         }
         if (replacement) {
@@ -54,6 +69,7 @@ void appendEscaped(std::string& out, const std::string& text, EscapeKind kind) {
         ++p;
     }
     out.append(plain, end);
+    return whole;
 }
 
 namespace {

@@ -1,6 +1,7 @@
 // The document base shared by the library's builders.
 #include <plotaid/ChartBase.h>
 
+#include "foundation/Report.h"
 #include "foundation/ValidatingParser.h"
 #include "foundation/XercesRuntime.h"
 
@@ -37,7 +38,7 @@ constexpr XMLCh kSchemaInstanceUri[] = u"http://www.w3.org/2001/XMLSchema-instan
 constexpr XMLCh kChartNamespace[] = u"http://plotaid.org/grxml";
 
 void report(const std::string& message, unsigned line) {
-    ChartErrorHandler().error(ChartException(message, kFile, line));
+    plotaid::detail::reportFailure(message, kFile, line);
 }
 
 std::string utf8(const XMLCh* text) {
@@ -146,8 +147,7 @@ bool ChartBase::ValidXML(const std::string& text) {
 }
 
 void ChartBase::releaseDocument(DOMDocument* document) {
-    if (document != nullptr)
-        document->release();
+    plotaid::detail::DocumentRelease()(document);
 }
 
 int ChartBase::AddAttributeDoc(DOMDocument* document, DOMElement* element, const XMLCh* name,

@@ -1,6 +1,8 @@
 #ifndef PLOTAID_FOUNDATION_VALIDATINGPARSER_H
 #define PLOTAID_FOUNDATION_VALIDATINGPARSER_H
 
+#include "foundation/OwnedDocument.h"
+
 #include <plotaid/ChartException.h>
 
 #include <xercesc/util/XercesDefs.hpp>
@@ -16,12 +18,6 @@ class DOMDocument;
 XERCES_CPP_NAMESPACE_END
 
 namespace plotaid::detail {
-
-// Releases a document that its holder owns. Xerces-C must still be up (hold a XercesRuntime).
-struct DocumentRelease {
-    void operator()(XERCES_CPP_NAMESPACE::DOMDocument* document) const noexcept;
-};
-using OwnedDocument = std::unique_ptr<XERCES_CPP_NAMESPACE::DOMDocument, DocumentRelease>;
 
 // The library's one way to parse XML. The parser always validates (namespaces and schemas on,
 // ignorable white space dropped), reads schemas and other entities only from the resource folder

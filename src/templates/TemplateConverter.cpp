@@ -1,6 +1,8 @@
 // The conversion point for templates of the earlier form.
 #include "templates/TemplateConverter.h"
 
+#include "foundation/OwnedDocument.h"
+
 #include <grx/ChartPrinter.h>
 
 #include <xercesc/dom/DOM.hpp>
@@ -30,10 +32,6 @@ const char* const kBareTemplate =
 
 std::atomic<unsigned> conversions{0};
 
-struct Release {
-    void operator()(DOMDocument* d) const { d->release(); }
-};
-
 } // namespace
 
 std::string convertTemplate(const DOMDocument* /*old*/) {
@@ -41,7 +39,7 @@ std::string convertTemplate(const DOMDocument* /*old*/) {
         DOMImplementation* implementation = DOMImplementationRegistry::getDOMImplementation(u"LS");
         if (implementation == nullptr)
             return kBareTemplate;
-        std::unique_ptr<DOMDocument, Release> converted(
+        const plotaid::detail::OwnedDocument converted(
             implementation->createDocument(kNamespace, kTemplate, nullptr));
         DOMElement* root = converted->getDocumentElement();
         root->setAttributeNS(kXmlnsUri, u"xmlns", kNamespace);

@@ -1,9 +1,10 @@
 // The chart transformer: a chart kept apart from its data sources, merged back on request.
 #include <plotaid/ChartTransformer.h>
 
+#include "foundation/OwnedDocument.h"
+#include "foundation/Report.h"
 #include "foundation/ValidatingParser.h"
 
-#include <plotaid/ChartErrorHandler.h>
 #include <plotaid/ChartException.h>
 #include <plotaid/ChartTemplate.h>
 #include <plotaid/XmlDataHandler.h>
@@ -16,7 +17,6 @@
 #include <zpack/zpack.h>
 
 #include <xercesc/dom/DOM.hpp>
-#include <xercesc/util/XMLChar.hpp>
 #include <xercesc/util/XMLString.hpp>
 
 #include <algorithm>
@@ -26,6 +26,7 @@
 #include <vector>
 
 using namespace XERCES_CPP_NAMESPACE;
+using plotaid::detail::guarded;
 
 namespace {
 
@@ -39,8 +40,8 @@ constexpr XMLCh kGraphSources[] = u"graphSources";
 int templateDumpCount = 1;
 int popupDumpCount = 1;
 
-void report(const std::string& message, int line) {
-    ChartErrorHandler().error(ChartException(message, kFile, line));
+void report(const std::string& message, unsigned line) {
+    plotaid::detail::reportFailure(message, kFile, line);
 }
 
 bool dumpsWanted() {
@@ -63,45 +64,6 @@ const char* const kPopupTemplate =
     "xsi:schemaLocation=\"http://plotaid.org/grxml http://plotaid.org/grxml/grxml-template-3.5.xsd\">"
     "<addPopups x=\"true\" y=\"true\" z=\"true\" legend=\"true\"/></template>\n";
 
-// Source ids are XML ids in both grammars; a name that is not one would make the data document
-// invalid for any other reader, and could never match a chart's reference anyway.
-bool allSourceIdsAreNames(const DOMElement* root, std::string& bad) {
-    for (const DOMElement* e = root->getFirstElementChild(); e != nullptr; e = e->getNextElementSibling()) {
-        const XMLCh* id = e->getAttribute(GrxUni::_id);
-        if (id == nullptr || *id == 0)
-            continue;
-        if (!XMLChar1_0::isValidNCName(id, XMLString::stringLen(id))) {
-            bad = utf8(id);
-            return false;
-        }
-    }
-    return true;
-}
-
-// The printer does not count the data root's own default-namespace declaration, so it declares the
-// chart namespace again on every source. Readers of data documents look for a source's start tag
-// as "<embeddedSource id=", so the repeated declaration goes: escaping keeps "<" out of text and
-// attribute values, so only start tags can match, and all sources sit right under the root.
-void dropRepeatedNamespace(std::string& text) {
-    static const char* const kTags[] = {"userSource", "databaseSource", "delimitedFileSource",
-                                        "streamingSource", "embeddedSource"};
-    for (const char* tag : kTags) {
-        const std::string repeated = std::string("<") + tag + " xmlns=\"http://plotaid.org/grxml\"";
-        const std::string plain = std::string("<") + tag;
-        std::string out;
-        std::size_t from = 0;
-        for (std::size_t at; (at = text.find(repeated, from)) != std::string::npos;
-             from = at + repeated.size()) {
-            out.append(text, from, at - from);
-            out += plain;
-        }
-        if (from == 0)
-            continue;
-        out.append(text, from, std::string::npos);
-        text.swap(out);
-    }
-}
-
 bool isDataRoot(const DOMElement* root) {
     return root != nullptr && sameText(root->getLocalName(), kGraphSources) &&
            sameText(root->getNamespaceURI(), ChartBase::_schemaDatabLocationValue);
@@ -109,17 +71,21 @@ bool isDataRoot(const DOMElement* root) {
 
 } // namespace
 
+struct ChartTransformer::MadeData {
+    plotaid::detail::OwnedDocument document;
+};
+
 ChartTransformer::ChartTransformer(const std::string& xml) {
-    try {
-        if (xml.empty() || !buildVisualization(xml))
-            return;
-        moveSourcesToData();
-    } catch (...) {
+    const bool built = guarded(kFile, 120, "ChartTransformer ctor fatal error", false, [&] {
+        if (!xml.empty() && buildVisualization(xml))
+            moveSourcesToData();
+        return true;
+    });
+    if (!built) {
         visualization_.reset();
         data_.clear();
         madeData_.reset();
         sources_.clear();
-        report("ChartTransformer ctor fatal error", 120);
     }
 }
 
@@ -140,15 +106,14 @@ ChartTransformer::ChartTransformer(const std::string& compressedXml, const std::
 ChartTransformer::ChartTransformer(const std::string& compressedXml, const unsigned char* dataStream,
                                    unsigned int length)
     : dataStream_(dataStream), dataStreamLength_(dataStream != nullptr ? length : 0) {
-    try {
+    const bool built = guarded(kFile, 260, "ChartTransformer ctor fatal error", false, [&] {
         std::string text;
-        if (!zpack::decompressString(text, compressedXml))
-            return;
-        buildVisualization(text);
-    } catch (...) {
+        if (zpack::decompressString(text, compressedXml))
+            buildVisualization(text);
+        return true;
+    });
+    if (!built)
         visualization_.reset();
-        report("ChartTransformer ctor fatal error", 260);
-    }
 }
 
 ChartTransformer::~ChartTransformer() = default;
@@ -206,8 +171,8 @@ void ChartTransformer::moveSourcesToData() {
 
 const DOMDocument* ChartTransformer::madeDataDocument() {
     if (madeData_ || sources_.empty())
-        return madeData_.get();
-    std::unique_ptr<DOMDocument, DocumentRelease> made(createDataDocument(kUtf8));
+        return madeData_ ? madeData_->document.get() : nullptr;
+    plotaid::detail::OwnedDocument made(createDataDocument(kUtf8));
     if (!made || made->getDocumentElement() == nullptr) {
         report("ChartTransformer: no data document could be made", 180);
         return nullptr;
@@ -215,12 +180,8 @@ const DOMDocument* ChartTransformer::madeDataDocument() {
     DOMElement* root = made->getDocumentElement();
     for (const DOMElement* source : sources_)
         root->appendChild(made->importNode(source, true));
-    madeData_ = std::move(made);
-    return madeData_.get();
-}
-
-void ChartTransformer::DocumentRelease::operator()(DOMDocument* document) const {
-    ChartBase::releaseDocument(document);
+    madeData_ = std::make_unique<MadeData>(MadeData{std::move(made)});
+    return madeData_->document.get();
 }
 
 const std::string& ChartTransformer::compressedData() {
@@ -262,11 +223,21 @@ public:
             }
             swaps_.push_back({child, put});
         }
-        for (Swap& swap : swaps_)
-            chartRoot->replaceChild(swap.put, swap.reference);
         root_ = chartRoot;
+        try {
+            for (Swap& swap : swaps_)
+                chartRoot->replaceChild(swap.put, swap.reference);
+        } catch (...) {
+            restore(); // a swap that fails part-way leaves the chart as it was
+            throw;
+        }
     }
-    ~SourcesInPlace() {
+    ~SourcesInPlace() { restore(); }
+    SourcesInPlace(const SourcesInPlace&) = delete;
+    SourcesInPlace& operator=(const SourcesInPlace&) = delete;
+
+private:
+    void restore() noexcept {
         try {
             for (Swap& swap : swaps_)
                 if (swap.put->getParentNode() == root_)
@@ -275,11 +246,10 @@ public:
                 p->release();
         } catch (...) {
         }
+        swaps_.clear();
+        placeholders_.clear();
     }
-    SourcesInPlace(const SourcesInPlace&) = delete;
-    SourcesInPlace& operator=(const SourcesInPlace&) = delete;
 
-private:
     struct Swap {
         DOMNode* reference;
         DOMNode* put;
@@ -298,7 +268,7 @@ std::string ChartTransformer::getXML(const XMLCh*) {
 std::string ChartTransformer::getEntireXML(const XMLCh* encoding) {
     if (!visualization_)
         return {};
-    try {
+    return guarded(kFile, 427, "getEntireXML fatal error", std::string(), [&]() -> std::string {
         if (visualization_->getUserSources().empty())
             return visualization_->AsUTF8();
         DOMElement* chartRoot = visualization_->getImplementation();
@@ -349,10 +319,7 @@ std::string ChartTransformer::getEntireXML(const XMLCh* encoding) {
         }
         merged.wrap(wholeRoot);
         return merged.AsUTF8();
-    } catch (...) {
-        report("getEntireXML fatal error", 427);
-        return {};
-    }
+    });
 }
 
 std::string ChartTransformer::getCompressedXML() {
@@ -369,7 +336,8 @@ std::string ChartTransformer::getCompressedData() {
 
 unsigned char* ChartTransformer::getCompressedDataStream(unsigned int& length) {
     length = 0;
-    try {
+    unsigned char* none = nullptr;
+    return guarded(kFile, 500, "getCompressedDataStream fatal error", none, [&]() -> unsigned char* {
         if (dataStream_ != nullptr && dataStreamLength_ != 0) {
             unsigned char* copy = new unsigned char[dataStreamLength_];
             std::memcpy(copy, dataStream_, dataStreamLength_);
@@ -383,11 +351,7 @@ unsigned char* ChartTransformer::getCompressedDataStream(unsigned int& length) {
         if (stream == nullptr)
             length = 0;
         return stream;
-    } catch (...) {
-        length = 0;
-        report("getCompressedDataStream fatal error", 500);
-        return nullptr;
-    }
+    });
 }
 
 bool ChartTransformer::applyTemplate(const std::string& templateText) {
@@ -430,31 +394,25 @@ unsigned int ChartTransformer::addPopups() {
 }
 
 std::string ChartTransformer::compressDocument(const DOMDocument* document) {
-    try {
+    return guarded(kFile, 552, "compressDocument fatal error", std::string(), [&] {
         std::ostringstream text;
         if (document != nullptr) {
             ChartPrinter printer;
             printer.setPrintWhiteSpace(false);
             printer.Print(document, text);
         }
-        std::string printed = text.str();
-        if (document != nullptr && isDataRoot(document->getDocumentElement()))
-            dropRepeatedNamespace(printed);
         std::string compressed;
-        zpack::compressString(printed, compressed);
+        zpack::compressString(text.str(), compressed);
         return compressed;
-    } catch (...) {
-        report("compressDocument fatal error", 552);
-        return {};
-    }
+    });
 }
 
 DOMDocument* ChartTransformer::createDataDocument(const XMLCh* encoding) {
     DOMDocument* document = nullptr;
-    try {
+    guarded(kFile, 330, "createDataDocument fatal error", [&] {
         DOMImplementation* impl = DOMImplementationRegistry::getDOMImplementation(_implFeatures);
         if (impl == nullptr)
-            return nullptr;
+            return;
         document = impl->createDocument(_schemaDatabLocationValue, _gsgraphSources, nullptr);
         document->setStrictErrorChecking(true);
         document->setXmlStandalone(false);
@@ -466,45 +424,35 @@ DOMDocument* ChartTransformer::createDataDocument(const XMLCh* encoding) {
         root->setAttributeNS(xercesc::XMLUni::fgXMLNSURIName, _schemaDataLocationName,
                              _schemaDatabLocationValue);
         root->setAttributeNS(_schemaInstanceValue, _schemaLocationName, _schemaDataLocationValue);
-    } catch (...) {
-        report("createDataDocument fatal error", 330);
-    }
+    });
     return document;
 }
 
 DOMDocument* ChartTransformer::getDataDocument() {
-    DOMDocument* document = nullptr;
     if (!sources_.empty())
         return const_cast<DOMDocument*>(madeDataDocument());
-    int line = 452;
-    try {
-        if (!data_.empty()) {
+    DOMDocument* none = nullptr;
+    DOMDocument* document = nullptr;
+    unsigned line = 452;
+    if (!data_.empty()) {
+        document = guarded(kFile, line, "getDataDocument fatal error", none, [&]() -> DOMDocument* {
             std::string text;
-            if (!zpack::decompressString(text, data_))
-                return nullptr;
-            document = parseDocument(text);
-        } else if (dataStream_ != nullptr && dataStreamLength_ != 0) {
-            line = 471;
+            return zpack::decompressString(text, data_) ? parseDocument(text) : nullptr;
+        });
+    } else if (dataStream_ != nullptr && dataStreamLength_ != 0) {
+        line = 471;
+        document = guarded(kFile, line, "getDataDocument fatal error", none, [&]() -> DOMDocument* {
             std::string text;
             XmlDataHandler handler(dataStream_, dataStreamLength_);
-            if (!handler.GetXmlData(text, false))
-                return nullptr;
-            document = parseDocument(text);
-        }
-    } catch (...) {
-        report("getDataDocument fatal error", line);
-        return nullptr;
+            return handler.GetXmlData(text, false) ? parseDocument(text) : nullptr;
+        });
     }
     if (document == nullptr)
         return nullptr;
-    const DOMElement* root = document->getDocumentElement();
-    if (!isDataRoot(root)) {
+    // Source ids are taken as the chart's parse took them: one that is no XML name still names its
+    // source, and dropping it here would drop its rows from the chart.
+    if (!isDataRoot(document->getDocumentElement())) {
         report("getDataDocument: the data is not a data document", line);
-        return nullptr;
-    }
-    std::string bad;
-    if (!allSourceIdsAreNames(root, bad)) {
-        report("getDataDocument: data source name is not an XML name: " + bad, line);
         return nullptr;
     }
     return document;

@@ -1,10 +1,10 @@
 // The tree viewer's documents: display settings built and edited here, PMML kept compressed.
 #include <plotaid/TreeTransformer.h>
 
+#include "foundation/Report.h"
 #include "foundation/ValidatingParser.h"
 #include "tree/TreeVocabulary.h"
 
-#include <plotaid/ChartErrorHandler.h>
 #include <plotaid/ChartException.h>
 
 #include <grx/ChartPrinter.h>
@@ -24,10 +24,7 @@ namespace {
 const char* const kFile = "backend/chartxml/plotaid/src/TreeTransformer";
 
 void report(const std::string& message, std::uint32_t line) {
-    try {
-        ChartErrorHandler().error(ChartException(message, kFile, line));
-    } catch (...) {
-    }
+    reportFailure(message, kFile, line);
 }
 
 constexpr XMLCh kDisplaySettings[] = u"displaySettings";
@@ -90,18 +87,10 @@ std::string print(const DOMDocument* document, const XMLCh* encoding, bool white
     return out.str();
 }
 
-// Output documents are built and dropped within one call.
-struct ScopedDocument {
-    DOMDocument* document;
-    ScopedDocument(const ScopedDocument&) = delete;
-    ScopedDocument& operator=(const ScopedDocument&) = delete;
-    ~ScopedDocument() { ChartBase::releaseDocument(document); }
-};
-
 DOMDocument* newOutputDocument(const XMLCh* ns, const XMLCh* rootName, const XMLCh* schemaLocation,
                                const char* failure, std::uint32_t line) {
     DOMDocument* document = nullptr;
-    try {
+    guarded(kFile, line, failure, [&] {
         DOMImplementation* implementation =
             DOMImplementationRegistry::getDOMImplementation(ChartBase::_implFeatures);
         if (implementation == nullptr)
@@ -115,9 +104,7 @@ DOMDocument* newOutputDocument(const XMLCh* ns, const XMLCh* rootName, const XML
         root->setAttributeNS(kXmlnsNamespace, kXmlns, ns);
         root->setAttributeNS(kXmlnsNamespace, kXmlnsXsi, kSchemaInstanceNamespace);
         root->setAttributeNS(kSchemaInstanceNamespace, kSchemaLocation, schemaLocation);
-    } catch (...) {
-        report(failure, line);
-    }
+    });
     return document;
 }
 
@@ -181,27 +168,23 @@ struct TreeTransformer::Impl {
 
 TreeTransformer::TreeTransformer(const std::string& pmml, const std::string& displaySettings)
     : impl_(std::make_unique<Impl>()) {
-    try {
+    guarded(kFile, 257, "TreeTransformer fatal error", [&] {
         if (!zpack::compressString(pmml, compressedPmml_))
             report("TreeTransformer fatal error", 257);
         else
             pmmlLength_ = static_cast<unsigned long>(pmml.size());
         Impl::load(*this, displaySettings, 257);
-    } catch (...) {
-        report("TreeTransformer fatal error", 257);
-    }
+    });
 }
 
 TreeTransformer::TreeTransformer(const std::string& compressedPmml, unsigned long pmmlLength,
                                  const std::string& displaySettings)
     : impl_(std::make_unique<Impl>()) {
-    try {
+    guarded(kFile, 284, "TreeTransformer fatal error", [&] {
         compressedPmml_ = compressedPmml;
         pmmlLength_ = pmmlLength;
         Impl::load(*this, displaySettings, 284);
-    } catch (...) {
-        report("TreeTransformer fatal error", 284);
-    }
+    });
 }
 
 // The documents die before the parser and runtime that made them.
@@ -239,76 +222,64 @@ DOMDocument* TreeTransformer::displayDocument() const {
 }
 
 void TreeTransformer::SetOrientation(TreeOrientation orientation) {
-    try {
+    guarded(kFile, 520, "SetOrientation fatal error", [&] {
         DOMElement* element = impl_->option(kTreeOrientation);
         if (orientation >= TOP_DOWN && orientation <= RIGHT_TO_LEFT)
             Impl::set(element, kOrientation, kOrientations[orientation]);
-    } catch (...) {
-        report("SetOrientation fatal error", 520);
-    }
+    });
 }
 
 void TreeTransformer::SetTreeDisplayOption(TreeDisplayOption option) {
-    try {
+    guarded(kFile, 545, "SetTreeDisplayOption fatal error", [&] {
         DOMElement* element = impl_->option(kNodeContents);
         if (option >= TABLE && option <= BOTH)
             Impl::set(element, kContents, kDisplayOptions[option]);
-    } catch (...) {
-        report("SetTreeDisplayOption fatal error", 545);
-    }
+    });
 }
 
 void TreeTransformer::SetZoomFactor(int zoom) {
     if (zoom < 2 || zoom > 500)
         return;
-    try {
+    guarded(kFile, 570, "SetZoomFactor fatal error", [&] {
         Impl::set(impl_->option(kTreeZoom), kFactor, decimal(zoom).c_str());
-    } catch (...) {
-        report("SetZoomFactor fatal error", 570);
-    }
+    });
 }
 
 void TreeTransformer::ShowNodeDefs(bool show) {
-    try {
+    guarded(kFile, 590, "ShowNodeDefs fatal error", [&] {
         Impl::set(impl_->option(kPredictorRanges), kShow, show ? kTrue : kFalse);
-    } catch (...) {
-        report("ShowNodeDefs fatal error", 590);
-    }
+    });
 }
 
 void TreeTransformer::ShowBranchStatistics(bool show) {
-    try {
+    guarded(kFile, 610, "ShowBranchStatistics fatal error", [&] {
         Impl::set(impl_->option(kBranchStatistics), kShow, show ? kTrue : kFalse);
-    } catch (...) {
-        report("ShowBranchStatistics fatal error", 610);
-    }
+    });
 }
 
 void TreeTransformer::applyFont(std::string family) {
-    try {
+    guarded(kFile, 640, "applyFont fatal error", [&] {
         const xmlString text(std::move(family));
         Impl::set(impl_->option(kFontData), kFamily, text.getChars());
-    } catch (...) {
-        report("applyFont fatal error", 640);
-    }
+    });
 }
 
 void TreeTransformer::applyColors(ColorIds id, const std::vector<std::string>& colors) {
     if ((id != CHART_COLORS && id != SWATCH_COLORS) || !impl_->display)
         return;
-    try {
+    guarded(kFile, 700, "applyColors fatal error", [&] {
         DOMElement* element = impl_->option(id == CHART_COLORS ? kChartColors : kSwatchColors);
         DOMNodeList* items = element->getElementsByTagNameNS(element->getNamespaceURI(), kColorItem);
         const XMLSize_t existing = items->getLength();
         for (std::size_t i = 0; i < colors.size(); ++i) {
             const xmlString value(colors[i]);
-            DOMElement* item =
-                i < existing ? static_cast<DOMElement*>(items->item(i)) : impl_->append(element, kColorItem);
+            // An item without its value would not validate: an unconvertible colour adds none.
+            DOMElement* item = i < existing ? static_cast<DOMElement*>(items->item(i))
+                               : value.getChars() != nullptr ? impl_->append(element, kColorItem)
+                                                             : element;
             Impl::set(item, kValue, value.getChars());
         }
-    } catch (...) {
-        report("applyColors fatal error", 700);
-    }
+    });
 }
 
 namespace {
@@ -338,21 +309,17 @@ void setLanguage(DOMDocument* document, const XMLCh* attribute, std::string lang
 } // namespace
 
 void TreeTransformer::SetOutputLanguage(std::string language, std::string country) {
-    try {
+    guarded(kFile, 738, "SetOutputLanguage fatal error", [&] {
         setLanguage(impl_->display.get(), kOlang, std::move(language), country,
                     "SetOutputLanguage fatal error", 738);
-    } catch (...) {
-        report("SetOutputLanguage fatal error", 738);
-    }
+    });
 }
 
 void TreeTransformer::SetOutputLocale(std::string language, std::string country) {
-    try {
+    guarded(kFile, 761, "SetOutputLocale fatal error", [&] {
         setLanguage(impl_->display.get(), kLocale, std::move(language), country,
                     "SetOutputLocale fatal error", 761);
-    } catch (...) {
-        report("SetOutputLocale fatal error", 761);
-    }
+    });
 }
 
 DOMElement* TreeTransformer::GetStatFormatElement() {
@@ -371,7 +338,7 @@ DOMElement* TreeTransformer::GetNewPredictorItem() {
 }
 
 void TreeTransformer::addPredictorPrecision(std::string varName, long precision) {
-    try {
+    guarded(kFile, 800, "addPredictorPrecision fatal error", [&] {
         const xmlString name(std::move(varName));
         if (name.getChars() == nullptr && impl_->display) {
             report("addPredictorPrecision: the variable name is not valid in the host encoding", 800);
@@ -380,14 +347,12 @@ void TreeTransformer::addPredictorPrecision(std::string varName, long precision)
         DOMElement* item = GetNewPredictorItem();
         Impl::set(item, kVarName, name.getChars());
         Impl::set(item, kPrecision, decimal(precision).c_str());
-    } catch (...) {
-        report("addPredictorPrecision fatal error", 800);
-    }
+    });
 }
 
 void TreeTransformer::addPredictorDate(std::string varName, std::string formatName, long width,
                                        long precision) {
-    try {
+    guarded(kFile, 830, "addPredictorDate fatal error", [&] {
         const xmlString name(std::move(varName));
         const xmlString format(std::move(formatName));
         if ((name.getChars() == nullptr || format.getChars() == nullptr) && impl_->display) {
@@ -402,13 +367,11 @@ void TreeTransformer::addPredictorDate(std::string varName, std::string formatNa
         Impl::set(date, kName, format.getChars());
         Impl::set(date, kWidth, decimal(width).c_str());
         Impl::set(date, kPrecision, decimal(precision).c_str());
-    } catch (...) {
-        report("addPredictorDate fatal error", 830);
-    }
+    });
 }
 
 void TreeTransformer::addTargetDateFormat(std::string formatName, long width, long precision) {
-    try {
+    guarded(kFile, 870, "addTargetDateFormat fatal error", [&] {
         const xmlString format(std::move(formatName));
         DOMElement* statFormats = GetStatFormatElement();
         if (statFormats == nullptr)
@@ -423,15 +386,13 @@ void TreeTransformer::addTargetDateFormat(std::string formatName, long width, lo
         Impl::set(date, kName, format.getChars());
         Impl::set(date, kWidth, decimal(width).c_str());
         Impl::set(date, kPrecision, decimal(precision).c_str());
-    } catch (...) {
-        report("addTargetDateFormat fatal error", 870);
-    }
+    });
 }
 
 bool TreeTransformer::applyTemplate(const std::string& templateText) {
     if (templateText.empty())
         return false;
-    try {
+    return guarded(kFile, 480, "TreeTransformer::applyTemplate() fatal error", false, [&] {
         if (parseDocument(templateText) == nullptr)
             return false;
         const OwnedDocument templ = impl_->parser.adoptDocument();
@@ -441,10 +402,7 @@ bool TreeTransformer::applyTemplate(const std::string& templateText) {
             return false;
         }
         return mergeDOM(templ.get(), impl_->display.get());
-    } catch (...) {
-        report("TreeTransformer::applyTemplate() fatal error", 480);
-        return false;
-    }
+    });
 }
 
 bool TreeTransformer::mergeDOM(const DOMDocument* from, DOMDocument* to) {
@@ -469,15 +427,12 @@ DOMDocument* TreeTransformer::createDisplayDocument(const XMLCh* encoding) {
 std::string TreeTransformer::getDisplayData(const XMLCh* encoding) {
     if (!impl_->display)
         return std::string();
-    try {
-        const ScopedDocument output{createDisplayDocument(encoding)};
-        if (output.document == nullptr || !mergeDOM(impl_->display.get(), output.document))
+    return guarded(kFile, 347, "getDisplayData fatal error", std::string(), [&] {
+        const OwnedDocument output(createDisplayDocument(encoding));
+        if (output == nullptr || !mergeDOM(impl_->display.get(), output.get()))
             throw ChartException("getDisplayData fatal error", kFile, 347);
-        return print(output.document, encoding, true);
-    } catch (...) {
-        report("getDisplayData fatal error", 347);
-        return std::string();
-    }
+        return print(output.get(), encoding, true);
+    });
 }
 
 std::string TreeTransformer::getCompressedPMML(unsigned long* length) {
@@ -503,22 +458,20 @@ bool decompress(const std::string& compressed, unsigned long& length, std::strin
 } // namespace
 
 DOMDocument* TreeTransformer::setupPMMLDOM() {
-    try {
-        std::string text;
-        if (!decompress(compressedPmml_, pmmlLength_, text))
-            throw ChartException("setupPMMLDOM fatal error", kFile, 971);
-        if (parseDocument(text) == nullptr)
-            return nullptr;
-        OwnedDocument document = impl_->parser.adoptDocument();
-        if (!hasRoot(document.get(), kPMML, kPmmlNamespace))
-            throw ChartException("setupPMMLDOM fatal error", kFile, 971);
-        document_ = document.get();
-        impl_->pmml = std::move(document);
-        return document_;
-    } catch (...) {
-        report("setupPMMLDOM fatal error", 971);
-        return nullptr;
-    }
+    return guarded(kFile, 971, "setupPMMLDOM fatal error", static_cast<DOMDocument*>(nullptr),
+                   [&]() -> DOMDocument* {
+                       std::string text;
+                       if (!decompress(compressedPmml_, pmmlLength_, text))
+                           throw ChartException("setupPMMLDOM fatal error", kFile, 971);
+                       if (parseDocument(text) == nullptr)
+                           return nullptr;
+                       OwnedDocument document = impl_->parser.adoptDocument();
+                       if (!hasRoot(document.get(), kPMML, kPmmlNamespace))
+                           throw ChartException("setupPMMLDOM fatal error", kFile, 971);
+                       document_ = document.get();
+                       impl_->pmml = std::move(document);
+                       return document_;
+                   });
 }
 
 DOMDocument* TreeTransformer::createPMMLDocument(const XMLCh* encoding) {
@@ -527,17 +480,15 @@ DOMDocument* TreeTransformer::createPMMLDocument(const XMLCh* encoding) {
         newOutputDocument(kPmmlNamespace, kPMML, kPmmlSchemaLocation, "createPMMLDocument fatal error", 1048);
     if (document == nullptr)
         return nullptr;
-    try {
+    guarded(kFile, 1048, "createPMMLDocument fatal error", [&] {
         // The model's version; the XML version stays 1.0, the only one the DOM writes.
         document->getDocumentElement()->setAttribute(kVersion, kPmmlVersion);
-    } catch (...) {
-        report("createPMMLDocument fatal error", 1048);
-    }
+    });
     return document;
 }
 
 std::string TreeTransformer::getUncompressedPMML(const XMLCh* encoding) {
-    try {
+    return guarded(kFile, 407, "getUncompressedPMML fatal error", std::string(), [&] {
         // The previous document goes only once the new one is in place.
         DOMDocument* parsed = setupPMMLDOM();
         if (parsed == nullptr) {
@@ -546,27 +497,20 @@ std::string TreeTransformer::getUncompressedPMML(const XMLCh* encoding) {
             std::string text;
             return decompress(compressedPmml_, pmmlLength_, text) ? text : std::string();
         }
-        const ScopedDocument output{createPMMLDocument(encoding)};
-        if (output.document == nullptr || !mergeDOM(parsed, output.document))
+        const OwnedDocument output(createPMMLDocument(encoding));
+        if (output == nullptr || !mergeDOM(parsed, output.get()))
             throw ChartException("getUncompressedPMML fatal error", kFile, 407);
-        return print(output.document, encoding, true);
-    } catch (...) {
-        report("getUncompressedPMML fatal error", 407);
-        return std::string();
-    }
+        return print(output.get(), encoding, true);
+    });
 }
 
 std::string TreeTransformer::compressDocument(const DOMDocument* document) const {
-    std::string text;
-    try {
-        if (document != nullptr)
-            text = print(document, nullptr, false);
+    return guarded(kFile, 938, "compressDocument fatal error", std::string(), [&] {
+        const std::string text = document != nullptr ? print(document, nullptr, false) : std::string();
         std::string packed;
-        if (!zpack::compressString(text, packed))
-            throw ChartException("compressDocument fatal error", kFile, 938);
-        return packed;
-    } catch (...) {
+        if (zpack::compressString(text, packed))
+            return packed;
         report("compressDocument fatal error", 938);
-        return text;
-    }
+        return text; // what could not be compressed is handed out plain
+    });
 }

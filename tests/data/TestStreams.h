@@ -1,6 +1,8 @@
 #ifndef PLOTAID_TESTS_CHARTDATA_TESTSTREAMS_H
 #define PLOTAID_TESTS_CHARTDATA_TESTSTREAMS_H
 
+#include "foundation/RecordSink.h"
+
 #include <plotaid/VarDataProcessor.h>
 
 #include <zpack/zpack.h>

@@ -89,13 +89,27 @@ TEST(VarDataStore, ValuesAsTextAndDeletedRows) {
     EXPECT_EQ(store.GetValueAsString("s", "v", 5), "1.5e+300");
     EXPECT_EQ(store.GetDataPointer("s", "v")[6], kMissing);
     EXPECT_EQ(store.GetValueAsString("s", "short", 0), "");
-    EXPECT_EQ(store.DeleteRow("s", 10), 6u);
+    // A deleted row without a string moves the later strings with their rows all the same.
+    EXPECT_EQ(store.DeleteRow("s", 0), 5u);
+    EXPECT_EQ(store.GetValueAsString("s", "v", 1), "three");
+    EXPECT_EQ(store.GetValueAsString("s", "v", 2), "2147483648");
+    EXPECT_EQ(store.DeleteRow("s", 10), 5u);
     EXPECT_EQ(store.DeleteRow("absent", 0), 0u);
     // "zero" lost its only reference: its slot 0 is the next one taken.
     VarDataProcessor::_varinfo info;
     store.AddVariable("s", "w", &info);
     store.SetStringVariableValue(&info, 0, "new");
     EXPECT_EQ(info.stringMap->at(0), 0u);
+}
+
+TEST(VarDataStore, ManyDistinctStringsKeepTheirSlots) {
+    VarDataProcessor store;
+    VarDataProcessor::_varinfo info;
+    store.AddVariable("s", "v", &info);
+    for (unsigned r = 0; r < 50000; ++r)
+        ASSERT_TRUE(store.SetStringVariableValue(&info, r, "t" + std::to_string(r % 40000)));
+    EXPECT_EQ(info.stringMap->at(45000), 5000u);
+    EXPECT_EQ(store.GetValueAsString("s", "v", 49999), "t9999");
 }
 
 TEST(VarDataStore, StringTableCountsReferencesAndReusesSlots) {

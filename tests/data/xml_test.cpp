@@ -1,6 +1,7 @@
 #include "TestStreams.h"
 #include "support/GrammarSupport.h"
 
+#include <plotaid/ChartBase.h>
 #include <plotaid/XmlDataHandler.h>
 
 #include <gtest/gtest.h>
@@ -71,6 +72,19 @@ TEST(XmlDataWriter, DocumentLayoutAndEscapes) {
           "<row>x,y &amp; &apos;z&apos;&gt;\xE2\x82\xAC</row>"})
         EXPECT_NE(xml.find(part), std::string::npos) << part << " not in\n" << xml;
     EXPECT_EQ(storeOf(xml).GetValueAsString("a\"b<c", variable, 0), "x,y & 'z'>\xE2\x82\xAC");
+}
+
+TEST(XmlDataWriter, ControlCharactersNeverReachTheTextRaw) {
+    VarDataProcessor store;
+    const std::string name = "a\tb\x01";
+    store.AddVariable("s\r", name);
+    store.SetStringVariableValue("s\r", name, 0, "x\ny\x1f");
+    plotaid::detail::RecordCollector records;
+    const std::string xml = xmlOf(store);
+    EXPECT_TRUE(ChartBase::ValidXML(xml)) << xml;
+    EXPECT_EQ(records.records().size(), 1u) << "what cannot be written is reported once";
+    // Tab, line feed and carriage return come back; the others cannot and read as '?'.
+    EXPECT_EQ(storeOf(xml).GetValueAsString("s\r", "a\tb?", 0), "x\ny?");
 }
 
 TEST(XmlDataWriter, OutputValidatesWithXmllint) {
@@ -144,7 +158,14 @@ TEST(XmlDataReader, RowsNamesEmptyFieldsAndTexts) {
     VarDataProcessor store = storeOf(dataDocument(
         source("t", "a;b;c;d;e",
                "<row>1;;3;Clerical</row>\n<row>-2.5e3;0x10;;Manager;;99</row><row>;;;Clerical</row>") +
-        source("u", "e", "<row>a &amp; b</row>")));
+        source("u", "e", "<row>a &amp; b</row>") +
+        // Sources are found by their structure, whatever the attribute order, quotes and spacing.
+        "<!-- <embeddedSource id=\"comment\"> --><embeddedSource\n kind=\"x\"  id = 'q&amp;1' >"
+        "<names>v</names><row>4</row></embeddedSource ><gs:embeddedSource id=\"p\"/>"));
+    std::vector<std::string> sources;
+    store.GetSourceNames(sources);
+    EXPECT_EQ(sources, (std::vector<std::string>{"p", "q&1", "t", "u"}));
+    EXPECT_EQ(store.GetValueAsString("q&1", "v", 0), "4");
     EXPECT_EQ(store.GetRowCount("t"), 3u);
     const double* a = store.GetDataPointer("t", "a");
     const double* b = store.GetDataPointer("t", "b");

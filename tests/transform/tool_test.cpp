@@ -45,6 +45,23 @@ TEST_F(TransformerTest, ToolSplitsMergesAndAppliesOverAStream) {
     }
 }
 
+TEST_F(TransformerTest, ToolMergesTheRowsOfASourceNamedWithASpace) {
+    TempDir dir;
+    std::string chart = example("charts/area.xml");
+    for (std::size_t at; (at = chart.find("\"rain\"")) != std::string::npos;)
+        chart.replace(at, 6, "\"my data\"");
+    std::ofstream(dir.file("my.xml")) << chart;
+    ASSERT_EQ(runTool("chart split '" + dir.file("my.xml") + "'").exitCode, 0);
+    const ToolResult m = runTool("chart merge '" + dir.file("my.chart.xml") + "' '" + dir.file("my.data.xml") + "'");
+    EXPECT_EQ(m.exitCode, 0) << m.output;
+    std::size_t rows = 0;
+    for (std::size_t at = m.output.find("<row>"); at != std::string::npos; at = m.output.find("<row>", at + 1))
+        ++rows;
+    EXPECT_EQ(rows, 54u);
+    // A chart where its data belong is refused, not merged into a chart without rows.
+    EXPECT_EQ(runTool("chart merge '" + dir.file("my.chart.xml") + "' '" + dir.file("my.xml") + "'").exitCode, 1);
+}
+
 TEST_F(TransformerTest, ToolRefusesDataThatIsNotChartData) {
     TempDir dir;
     std::ofstream(dir.file("junk.bin"), std::ios::binary) << std::string("\x01\xb0 not a stream at all", 22);

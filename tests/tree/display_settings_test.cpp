@@ -197,6 +197,10 @@ TEST(TreeDisplay, UnusableSettingsMakeOptionsHarmlessAndReportOnce) {
     EXPECT_EQ(attr(first(tree, "fontData"), "family"), "Serif");
     tree.addPredictorPrecision(std::string("\xc3", 1), 2);
     EXPECT_EQ(elements(tree.displayDocument(), "predictorItem").size(), 0u);
+    tree.applyColors(TreeTransformer::CHART_COLORS, {"#FF000001", std::string("\xff", 1)});
+    EXPECT_EQ(values(tree.displayDocument(), "colorItem", "value"), std::vector<std::string>{"#FF000001"});
+    Reader reader;
+    EXPECT_NE(reader.read(tree.getDisplayData(nullptr)), nullptr);
 }
 
 TEST(TreeDisplay, OutputValidatesCarriesTheOptionsAndTakesAnEncoding) {

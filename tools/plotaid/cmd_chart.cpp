@@ -1,6 +1,7 @@
 // plotaid chart split CHART | chart merge CHART DATA: a chart apart from its data and back.
 #include "ChartInput.h"
 #include "Command.h"
+#include "foundation/RecordSink.h"
 
 #include <plotaid/ChartTransformer.h>
 
@@ -101,9 +102,14 @@ int merge(const Args& args) {
     ChartTransformer& chart = input.transformer();
     if (chart.getCompressedData().empty())
         return failure(kName, dataPath + ": the data cannot be read as chart data");
+    // Data that the library refuses while merging would leave the chart without its rows.
+    detail::RecordCollector records;
     const std::string text = chart.getEntireXML(u"UTF-8");
     if (text.empty())
         return failure(kName, "the chart could not be written");
+    for (const detail::LogRecord& r : records.records())
+        if (r.isError())
+            return failure(kName, dataPath + ": " + r.message);
     if (!writeFile(outPath, packed ? compressed(text) : text, error))
         return failure(kName, outPath + ": " + error);
     return kOk;
