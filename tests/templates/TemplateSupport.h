@@ -10,7 +10,8 @@
 
 #include "foundation/ValidatingParser.h"
 #include "templates/InstructionWalk.h"
-#include "templates/actions/Actions.h"
+#include "templates/actions/aesthetics.h"
+#include "templates/actions/style.h"
 
 #include <plotaid/BaseTemplate.h>
 #include <plotaid/ChartTemplate.h>
