@@ -144,7 +144,7 @@ std::vector<CTElementType*> BaseTemplate::getElementsWithSummaryStatistics(const
         if (statistics.empty())
             continue;
         const int method = statistics.front()->getMethod();
-        if (method == 4 || method == 10)
+        if (method == grx::SummaryMethod::binPercent || method == grx::SummaryMethod::histogram)
             found.push_back(element);
     }
     return found;
@@ -286,13 +286,13 @@ bool BaseTemplate::isIntervalRangeElement(const CTElementType& element) const {
     if (dynamic_cast<const GrxInterval*>(&element) == nullptr)
         return false;
     for (const GrxSummaryStatistic* statistic : element.getSummaryStatistics())
-        if (statistic->getMethod() == 7)
+        if (statistic->getMethod() == grx::SummaryMethod::range)
             return true;
     return false;
 }
 
 bool BaseTemplate::isAxisDerived(const GrxAxis& axis) const {
-    return axis.getTransform() != 2;
+    return axis.getTransform() != grx::AxisTransform::none;
 }
 
 bool BaseTemplate::getBooleanAttribute(const DOMElement* element, const XMLCh* name, bool absent) {

@@ -62,8 +62,8 @@ template <class Owner> std::uint32_t colour2ToColour(Owner& owner, bool force) {
         }
     }
     for (GrxColor* colour : owner.getColors())
-        if (colour->getAffect() != 1)
-            colour->setAffect(2);
+        if (colour->getAffect() != grx::Affect::both)
+            colour->setAffect(grx::Affect::main);
     return static_cast<std::uint32_t>(styleBys.size());
 }
 
@@ -97,7 +97,7 @@ namespace {
 // Scale, summary statistic, mappings of kind M, then the aesthetic's own attributes but its id.
 template <class M> void copyAestheticBody(BaseTemplate& cloner, const CTAesthetic& from, CTAesthetic& to) {
     if (const GrxScale* scale = from.getScale())
-        cloner.duplicateAttributes(*scale, to.addScale(3));
+        cloner.duplicateAttributes(*scale, to.addScale(grx::ScaleMethod::power));
     if (const GrxSummaryStatistic* statistic = from.getSummaryStatistic())
         cloner.duplicateAttributes(*statistic, to.addSummaryStatistic());
     for (const M* mapping : from.children<M>())

@@ -269,11 +269,11 @@ private:
             const bool matching = styleId_.equals(ChartBase::_container) || styleId_.equals(own->getId());
             if (matching && sourceSetsNoBreak<Kind>(*element)) {
                 if (missing_.equals(GrxUni::_gap))
-                    element->setBreakRepresentation(1);
+                    element->setBreakRepresentation(grx::BreakRepresentation::gap);
                 else if (missing_.equals(GrxUni::_wings))
-                    element->setBreakRepresentation(3);
+                    element->setBreakRepresentation(grx::BreakRepresentation::wings);
                 else if (missing_.equals(GrxUni::_interpolated))
-                    element->setBreakRepresentation(2);
+                    element->setBreakRepresentation(grx::BreakRepresentation::interpolated);
             }
             if (type_.empty() || (smoothOnlyMatching && !matching))
                 continue;
@@ -293,7 +293,7 @@ private:
         if (node == nullptr)
             return false;
         const Kind* same = GrxBaseElement::wrapperOf<Kind>(node);
-        return same == nullptr || same->getBreakRepresentation() == 0;
+        return same == nullptr || same->getBreakRepresentation() == grx::BreakRepresentation::none;
     }
 
     BaseTemplate& action_;

@@ -29,10 +29,6 @@ const std::string& scratchFolder() {
     return path;
 }
 
-std::string schemaFolder() {
-    return std::string(PLOTAID_SOURCE_DIR) + "/resources/schemas/";
-}
-
 std::string quoted(const std::string& s) {
     std::string out = "'";
     for (char c : s)
@@ -57,6 +53,10 @@ const std::string& catalog() {
     return path;
 }
 } // namespace
+
+std::string schemaFolder() {
+    return std::string(PLOTAID_SOURCE_DIR) + "/resources/schemas/";
+}
 
 std::vector<std::string> sampleCharts() {
     std::vector<std::string> charts;

@@ -19,6 +19,8 @@ namespace grammar_test {
 // Every sample chart under examples/charts, sorted.
 std::vector<std::string> sampleCharts();
 
+// The source tree's grammars, ending with '/'.
+std::string schemaFolder();
 std::string readText(const std::string& path);
 // Writes text to a new file in the test's scratch folder and returns its path.
 std::string writeScratch(const std::string& name, const std::string& text);

@@ -18,9 +18,6 @@ namespace plotaid::detail {
 
 namespace {
 
-// The object model's colour affect values.
-enum : int { kAffectBoth = 1, kAffectPrimary = 2, kAffectSecondary = 3 };
-
 // Dashes, shapes and the like: guard, then a new cycle each.
 template <class A>
 void replaceSelectedCycles(BaseTemplate& action, GrxVisualization& target, const GrxVisualization* source,
@@ -81,13 +78,13 @@ void setAffect(GrxColor& color, TSetColor::Affect affect) {
     const bool point = isPointNode(color.getImplementation()->getParentNode());
     switch (affect) {
     case TSetColor::Affect::Main:
-        color.setAffect(point ? kAffectSecondary : kAffectPrimary);
+        color.setAffect(point ? grx::Affect::secondary : grx::Affect::main);
         break;
     case TSetColor::Affect::Secondary:
-        color.setAffect(point ? kAffectPrimary : kAffectSecondary);
+        color.setAffect(point ? grx::Affect::main : grx::Affect::secondary);
         break;
     case TSetColor::Affect::Both:
-        color.setAffect(kAffectBoth);
+        color.setAffect(grx::Affect::both);
         break;
     case TSetColor::Affect::Unchanged:
         break;
@@ -371,7 +368,7 @@ bool TSetShowLineMarkers::apply() {
         cloneElementChildren(line, point, false);
         changeColor2ToColor(point, false);
         for (GrxColor* color : point.getColors())
-            color->setAffect(kAffectSecondary);
+            color->setAffect(grx::Affect::secondary);
 
         // The line's dash series becomes the markers' shape series.
         const std::vector<GrxDash*> dashes = line.getDashs();
@@ -379,7 +376,7 @@ bool TSetShowLineMarkers::apply() {
             const GrxDash& dash = *dashes.front();
             GrxShape& shape = point.addShape();
             if (const GrxScale* scale = dash.getScale())
-                duplicateAttributes(*scale, shape.addScale(3));
+                duplicateAttributes(*scale, shape.addScale(grx::ScaleMethod::power));
             if (const GrxSummaryStatistic* statistic = dash.getSummaryStatistic())
                 duplicateAttributes(*statistic, shape.addSummaryStatistic());
             duplicateAttributes(dash, shape);

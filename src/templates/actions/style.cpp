@@ -156,7 +156,7 @@ struct ElementStyling {
     void barRule(const GrrUviza& graph, GrxInterval& interval, DOMElement& declaration) const {
         const bool clustered = same(subtype, BaseTemplate::_clustered);
         const bool styled =
-            action.isGraphClustered(graph) ? clustered : !clustered && interval.getPositionModifier() != 7;
+            action.isGraphClustered(graph) ? clustered : !clustered && interval.getPositionModifier() != grx::PositionModifier::dodge;
         if (styled)
             styleElement(interval, declaration, false);
     }
@@ -211,7 +211,7 @@ struct ElementStyling {
             if (!summaries.empty()) {
                 const bool range =
                     std::any_of(summaries.begin(), summaries.end(),
-                                [](const GrxSummaryStatistic* s) { return s->getMethod() == 7; });
+                                [](const GrxSummaryStatistic* s) { return s->getMethod() == grx::SummaryMethod::range; });
                 if (range && is(GrxUni::_range) && symbol.equals(GrxUni::_square)) {
                     styleElement(interval, declaration, false);
                     return;

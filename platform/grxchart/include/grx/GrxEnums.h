@@ -149,7 +149,20 @@ inline constexpr EnumWord kFontWeight[] = {GRX_WORD(FontWeight, regular), GRX_WO
 
 // Enumerations written as numbers: only the values the library tests for are named.
 struct SummaryMethod {
-    enum : int { none = 0, count = 1, percent = 3, range = 7, histogram = 10, rangeLow = 18, rangeHigh = 19 };
+    enum : int {
+        none = 0,
+        count = 1,
+        percent = 3,
+        binPercent = 4, // share of cases per bin, as histograms show it
+        range = 7,
+        histogram = 10,
+        rangeLow = 18,
+        rangeHigh = 19
+    };
+};
+// How an element sits beside its neighbours: stacked, or moved aside (bars beside a cluster).
+struct PositionModifier {
+    enum : int { none = 0, spikes = 1, stack = 3, stackPercent = 4, dodge = 7 };
 };
 struct SmoothMethod {
     enum : int { linear = 0, loess = 1, polynomial = 6, spline = 12, stepLeft = 13, stepRight = 14, step = 15 };
