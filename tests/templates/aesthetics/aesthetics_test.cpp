@@ -7,6 +7,8 @@ using namespace plotaid::detail;
 
 namespace {
 
+using Aesthetics = TemplateTest;
+
 // A chart around a graph body: variables var_a and var_b, a domain, styles "plainStyle" (colour
 // #112233) and "otherStyle", and a style cycle "chartCycle" to refer to.
 std::string chartWith(const std::string& graphBody, const std::string& extra = std::string()) {
@@ -20,8 +22,6 @@ std::string chartWith(const std::string& graphBody, const std::string& extra = s
         "<dimension id='dim_y'/></coordinates>" +
         graphBody + "</graph>" + extra + "<userSource id='data'/>");
 }
-
-// ---- setColor ----------------------------------------------------------------------------------
 
 const std::string kStyles = "[({color=#010101;}{color=#020202;})]";
 std::string setColor(const std::string& attributes = std::string()) {
@@ -37,9 +37,7 @@ const std::string kTags = chartWith(
     "coordinates='coordinates_1'><color id='b1' variable='var_a' cycle='chartCycle'/>"
     "<color id='b2' variable='var_b'/></interval>");
 
-using SetColor = TemplateTest;
-
-TEST_F(SetColor, ElementsOfOneTagShareOneNewCycleAndANumberSelectsByPosition) {
+TEST_F(Aesthetics, SetColorElementsOfOneTagShareOneNewCycleAndANumberSelectsByPosition) {
     GrxVisualization& chart = parse(kTags);
     EXPECT_TRUE(act<TSetColor>(setColor(), chart));
     const std::string bars = cycleIdOf(chart, "a1");
@@ -66,7 +64,7 @@ TEST_F(SetColor, ElementsOfOneTagShareOneNewCycleAndANumberSelectsByPosition) {
     EXPECT_EQ(second.AsUTF8(), before);
 }
 
-TEST_F(SetColor, AffectModesDependOnWhetherTheColourBelongsToAPoint) {
+TEST_F(Aesthetics, SetColorAffectModesDependOnWhetherTheColourBelongsToAPoint) {
     // The sample has "secondary" on the interval's colour_1 and "main" on the point's colour_2.
     const struct {
         const char *affect, *interval, *point;
@@ -84,7 +82,7 @@ TEST_F(SetColor, AffectModesDependOnWhetherTheColourBelongsToAPoint) {
     }
 }
 
-TEST_F(SetColor, ASourceThatSetsTheCycleKeepsTheColourAndTwiceReadsAsOnce) {
+TEST_F(Aesthetics, SetColorASourceThatSetsTheCycleKeepsTheColourAndTwiceReadsAsOnce) {
     GrxVisualization& chart = sample("error-bars.xml");
     GrxVisualization& source = sample("error-bars.xml");
     byId<GrxColor>(source, "color_2")->removeCycle();
@@ -102,8 +100,6 @@ TEST_F(SetColor, ASourceThatSetsTheCycleKeepsTheColourAndTwiceReadsAsOnce) {
     act<TSetColor>("<setColor><cycle><style color='#999999'/></cycle></setColor>", twice);
     EXPECT_NE(canonical(twice), canonical(once));
 }
-
-// ---- setDash, setPattern, setSize ----------------------------------------------------------------
 
 const std::string kDashes = "<cycle><style stroke-dasharray='4 4'/><style stroke-dasharray='1 3'/></cycle>";
 const std::string kDashStyles = "[({stroke-dasharray=4 4;}{stroke-dasharray=1 3;})]";
@@ -129,9 +125,7 @@ std::string mappingsOf(const GrxVisualization& chart, const char* id) {
     return out;
 }
 
-using SetCycles = TemplateTest;
-
-TEST_F(SetCycles, EachSelectedDashGetsACycleOfItsOwnUnlessTheSourceSetsOne) {
+TEST_F(Aesthetics, EachSelectedDashGetsACycleOfItsOwnUnlessTheSourceSetsOne) {
     GrxVisualization& chart = parse(kSeries);
     const std::size_t cyclesBefore = chart.getStyleCycles().size();
     EXPECT_TRUE(act<TSetDash>(kSetDash, chart));
@@ -159,7 +153,7 @@ TEST_F(SetCycles, EachSelectedDashGetsACycleOfItsOwnUnlessTheSourceSetsOne) {
     EXPECT_EQ(stylesOf(guarded, "dash_2"), kDashStyles);
 }
 
-TEST_F(SetCycles, PatternsGetANewCycleOverAWhiteFillUnlessTheSourceStyleHasAColour) {
+TEST_F(Aesthetics, PatternsGetANewCycleOverAWhiteFillUnlessTheSourceStyleHasAColour) {
     const std::string setPattern = "<setPattern><cycle><style pattern='3'/></cycle></setPattern>";
     GrxVisualization& chart = parse(kSeries);
     EXPECT_TRUE(act<TSetPattern>(setPattern, chart));
@@ -180,7 +174,7 @@ TEST_F(SetCycles, PatternsGetANewCycleOverAWhiteFillUnlessTheSourceStyleHasAColo
               "#112233 white");
 }
 
-TEST_F(SetCycles, SizeParametersReplaceLowHighCycleAndDomainByMappingsOfTheElementType) {
+TEST_F(Aesthetics, SizeParametersReplaceLowHighCycleAndDomainByMappingsOfTheElementType) {
     GrxVisualization& chart = parse(kSeries);
     EXPECT_TRUE(act<TSetSize>("<setSize>" + kMappings + kDashes + "</setSize>", chart));
     const GrxSize& size = *byId<GrxSize>(chart, "pointSize");
@@ -215,8 +209,6 @@ TEST_F(SetCycles, SizeParametersReplaceLowHighCycleAndDomainByMappingsOfTheEleme
     }
 }
 
-// ---- addDash (the conversion addImage shares) ----------------------------------------------------
-
 // A line with a colour that carries every attribute, its own dash, and a bare colour; a legend
 // listing both colours.
 const std::string kColours = chartWith(
@@ -227,9 +219,7 @@ const std::string kColours = chartWith(
     "<legendTarget id='target_b' target='colour_b'/></legend>");
 const std::string kAddDash = "<addDash><cycle><style stroke-dasharray='3 1'/></cycle></addDash>";
 
-using AddDash = TemplateTest;
-
-TEST_F(AddDash, EveryColourBecomesADashUnderItsIdOnce) {
+TEST_F(Aesthetics, AddDashEveryColourBecomesADashUnderItsIdOnce) {
     GrxVisualization& chart = parse(kColours);
     EXPECT_TRUE(act<TAddDash>(kAddDash, chart));
     const GrxLine& line = *byId<GrxLine>(chart, "line_1");
@@ -261,8 +251,6 @@ TEST_F(AddDash, EveryColourBecomesADashUnderItsIdOnce) {
     EXPECT_EQ(u8(left.front()->getId()), "colour_a");
     EXPECT_NE(byId<GrxDash>(numbered, "colour_b"), nullptr);
 }
-
-// ---- setGenericAttributes ------------------------------------------------------------------------
 
 // Three labels: one under an axis (first in document order), two under label frames.
 const std::string kLabels = chartWith(
@@ -349,13 +337,9 @@ TEST_F(SetGenericAttributes, NothingToFindOrWriteFailsAndStylesMadeOnTheWayAreNo
     EXPECT_EQ(chart_->AsUTF8(), once);
 }
 
-// ---- setShowLineMarkers --------------------------------------------------------------------------
-
 const std::string kMarkers = "<setShowLineMarkers><style size='6pt' color2='#333333'/></setShowLineMarkers>";
 
-using SetShowLineMarkers = TemplateTest;
-
-TEST_F(SetShowLineMarkers, ALoneLineGetsPointsThatShowItsSeriesOnce) {
+TEST_F(Aesthetics, SetShowLineMarkersALoneLineGetsPointsThatShowItsSeriesOnce) {
     GrxVisualization& chart = sample("line-series.xml");
     const std::size_t legendTargets = chart.getLegends().front()->getLegendTargets().size();
     EXPECT_TRUE(act<TSetShowLineMarkers>(kMarkers, chart));
@@ -386,7 +370,7 @@ TEST_F(SetShowLineMarkers, ALoneLineGetsPointsThatShowItsSeriesOnce) {
     EXPECT_EQ(chart.AsUTF8(), once);
 }
 
-TEST_F(SetShowLineMarkers, ADashsScaleAndStatisticGoOverToTheShapeAndNoDashesNoShape) {
+TEST_F(Aesthetics, SetShowLineMarkersADashsScaleAndStatisticGoOverToTheShapeAndNoDashesNoShape) {
     GrxVisualization& chart = parse(chartWith(
         "<path id='path_1' coordinates='coordinates_1'><x variable='var_a'/><y variable='var_b'/>"
         "<dash id='dash_1' variable='var_a' cycle='chartCycle' name='series'><scale method='log' base='2'/>"

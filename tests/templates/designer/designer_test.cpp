@@ -1,12 +1,15 @@
-// The example templates: each sound to both validators; each designer template, applied by
-// `plotaid apply --report` to each sample chart, applies every instruction and writes a sound chart,
-// applied twice restyles nothing further, and visibly does what it is for.
+// The example templates: each sound to both validators; each applied alone to each sample chart
+// prints as it did before the action kit; each designer template applies every instruction, gives a
+// sound chart, applied twice restyles nothing further, and visibly does what it is for.
 #include "templates/TemplateSupport.h"
 
-#include "support/ToolRunner.h"
+#include <grx/ChartPrinter.h>
 
 #include <algorithm>
+#include <cstdint>
+#include <cstdlib>
 #include <filesystem>
+#include <fstream>
 #include <set>
 #include <sstream>
 
@@ -26,24 +29,27 @@ std::vector<std::string> exampleFiles(const std::string& folder, const std::stri
     std::sort(names.begin(), names.end());
     return names;
 }
-std::string examplePath(const std::string& relative) {
-    return std::string(PLOTAID_EXAMPLES_DIR) + "/" + relative;
+
+// FNV-1a: a digest the golden list can hold in a line per output.
+std::uint64_t digest(const std::string& text) {
+    std::uint64_t h = 14695981039346656037ull;
+    for (unsigned char c : text)
+        h = (h ^ c) * 1099511628211ull;
+    return h;
 }
 
 class Designer : public TemplateTest {
 protected:
     // The chart with the named example templates applied in order, in-process and without a
     // source, as the tool applies them.
-    GrxVisualization& applied(GrxVisualization& chart, const std::vector<std::string>& templates) {
+    GrxVisualization& applied(const std::string& chart, const std::vector<std::string>& templates) {
+        GrxVisualization& c = sample(chart);
         for (const std::string& name : templates) {
-            ChartTemplate t(chart, nullptr);
+            ChartTemplate t(c, nullptr);
             EXPECT_TRUE(t.setTemplate(example("templates/" + name))) << name;
             t.applyTemplate();
         }
-        return chart;
-    }
-    GrxVisualization& applied(const std::string& chart, const std::vector<std::string>& templates) {
-        return applied(sample(chart), templates);
+        return c;
     }
 };
 
@@ -58,44 +64,49 @@ TEST_F(Designer, EveryExampleTemplateValidatesWithXercesAndXmllint) {
             nullptr)
             << name << ::testing::PrintToString(parser.lastErrors());
         if (grammar_test::haveXmllint()) {
-            const grammar_test::LintResult r =
-                grammar_test::xmllint("grxml-template-3.5.xsd", examplePath("templates/" + name));
+            const grammar_test::LintResult r = grammar_test::xmllint(
+                "grxml-template-3.5.xsd", std::string(PLOTAID_EXAMPLES_DIR) + "/templates/" + name);
             EXPECT_EQ(r.exitCode, 0) << name << r.output;
         }
     }
 }
 
-TEST_F(Designer, OnEverySampleChartEachInstructionAppliesTheResultValidatesAndTwiceIsOnce) {
+// Each template applied once to each chart; the printed outputs are kept as digests
+// (PLOTAID_WRITE_GOLDEN=1 rewrites them).
+TEST_F(Designer, OnEverySampleChartTheOutputIsKeptAndEachDesignerInstructionAppliesOnce) {
     const std::vector<std::string> charts = exampleFiles("charts", ".xml");
     ASSERT_GE(charts.size(), 15u);
-    TempDir scratch;
-    for (const std::string& name : kDesigner) {
-        for (const std::string& chart : charts) {
+    const std::string golden = std::string(PLOTAID_TEST_DATA_DIR) + "/templates/sample-outputs.txt";
+    std::ostringstream now;
+    for (const std::string& chart : charts)
+        for (const std::string& name : exampleFiles("templates", ".sgt")) {
             SCOPED_TRACE(name + " on " + chart);
-            const std::string out = scratch.file(name + "-" + chart);
-            const ToolResult r =
-                runTool("apply --chart '" + examplePath("charts/" + chart) + "' --template '" +
-                        examplePath("templates/" + name) + "' -o '" + out + "' --report");
-            EXPECT_EQ(r.exitCode, 0) << r.output;
             WalkReport report;
             GrxVisualization& once = applied(chart, {name});
+            std::ostringstream printed;
+            ChartPrinter().Print(root(once)->getOwnerDocument(), printed);
+            // Graphs in containers are left out: their output was meant to change.
+            if (chart != "container-lines.xml")
+                now << chart << ' ' << name << ' ' << std::hex << digest(printed.str()) << std::dec << '\n';
+            if (std::find(kDesigner.begin(), kDesigner.end(), name) == kDesigner.end())
+                continue;
             std::set<std::string> tags;
             for (const InstructionOutcome& o : report.outcomes()) {
                 tags.insert(o.tag);
-                const std::string line = examplePath("templates/" + name) + " #" +
-                                         std::to_string(o.position) + " " + o.tag + ": applied\n";
-                EXPECT_NE(r.output.find(line), std::string::npos) << line << r.output;
+                EXPECT_EQ(o.kind, InstructionOutcome::Applied) << "#" << o.position << " " << o.tag;
             }
             EXPECT_GE(tags.size(), 3u);
-            const std::string written = readAll(out);
-            ASSERT_FALSE(written.empty()) << r.output;
-            EXPECT_EQ(grammar_test::chartFaults(written), "");
+            EXPECT_EQ(grammar_test::chartFaults(once), "");
             // Every instruction of these templates replaces what it sets (the one that appends
             // does so once per chart), so a second application changes nothing.
             EXPECT_NE(canonical(sample(chart)), canonical(once));
             EXPECT_EQ(canonical(applied(chart, {name, name})), canonical(once));
         }
+    if (std::getenv("PLOTAID_WRITE_GOLDEN") != nullptr) {
+        std::ofstream(golden) << now.str();
+        GTEST_SKIP() << "wrote " << golden;
     }
+    EXPECT_EQ(readAll(golden), now.str());
 }
 
 TEST_F(Designer, EachTemplateDoesWhatItIsFor) {

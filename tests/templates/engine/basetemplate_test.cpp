@@ -44,6 +44,7 @@ TEST_F(BaseTemplateTest, GraphsAreSelectedByNumberAndAllCounted) {
         const DOMElement* instruction;
         std::vector<GrrUviza*> picked;
     } cases[] = {{instruction({{u"graph", u"2"}}), {&b}},
+                 {instruction({{u"graph", u"3"}}), {&c}},
                  {instruction({}), {&g_, &b, &c}},
                  {instruction({{u"graph", u"7"}}), {}},
                  {nullptr, {&g_, &b, &c}}};

@@ -93,7 +93,6 @@ TEST_F(FormatImport, EachFormatKindSetsWhatItNamesAndClearsWhatItMustOnly) {
         {"scientific=4", "<numberFormat scientific='true'/>", "scientific=1"},
         {"scientific=4", "<numberFormat scientific='never'/>", "scientific=2"},
         {"scientific=4", "<numberFormat scientific='false'/>", "scientific=2"},
-        {"scientific=4", "<numberFormat scientific='sometimes'/>", "scientific=4"},
         {"scientific=4", "<numberFormat scientific=''/>", "scientific=4"},
         {"scientific=4", "<numberFormat scientific='Always'/>", "scientific=4"},
         // Digits and scaling only when given and not empty.

@@ -2,7 +2,6 @@
 // of elements by type, each declaration reaching the graphs of its number.
 #include "templates/TemplateSupport.h"
 
-#include <set>
 #include <sstream>
 
 using namespace template_test;
@@ -69,24 +68,19 @@ protected:
                 EXPECT_EQ(got, want) << item;
         }
         if (changed != nullptr) {
-            const auto after = styleSnapshot(c);
-            std::set<std::string> ids;
-            for (const auto* snapshot : {&before, &after})
-                for (const auto& entry : *snapshot)
-                    if (!before.count(entry.first) || !after.count(entry.first) ||
-                        before.at(entry.first) != after.at(entry.first))
-                        ids.insert(entry.first);
+            auto after = styleSnapshot(c);
             std::string joined;
-            for (const std::string& id : ids)
-                joined += (joined.empty() ? "" : " ") + id;
+            for (const auto& [id, attributes] : before) // the ids of both, sorted
+                after.emplace(id, "<removed>");
+            for (const auto& [id, attributes] : after)
+                if (!before.count(id) || before.at(id) != attributes)
+                    joined += (joined.empty() ? "" : " ") + id;
             EXPECT_EQ(joined, changed);
             EXPECT_TRUE(*changed != '\0' || c.AsUTF8() == text) << "the chart changed";
         }
         return c;
     }
 };
-
-// ---- one style by id, and texts ------------------------------------------------------------------
 
 TEST_F(SetStyle, ByIdTheNamedStyleTakesDeclarationZeroWhereverItIs) {
     expectStyles("simple-bar.xml", "<setStyle id=\"titleStyle\"><style color=\"red\"/></setStyle>",
@@ -232,8 +226,6 @@ TEST_F(SetStyle, PanelLabelsAndTitlesByLevel) {
         expectStyles("panels.xml", panel("textFrame", "panel_title", ""), "axisLabelStyle:!red");
     EXPECT_EQ(attr(byId<GrxLabel>(panels, "facet_gender_label")->getTextFrameStyle(), "color"), "red");
 }
-
-// ---- elements by type ----------------------------------------------------------------------------
 
 struct GraphPlan {
     std::string id;

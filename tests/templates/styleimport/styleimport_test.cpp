@@ -214,8 +214,6 @@ TEST_F(StyleImport, ImportingTwiceGivesTheSameChartAsOnce) {
     }
 }
 
-// ---- interpolation -------------------------------------------------------------------------------
-
 // A graph with two lines (one of style "lineStyle", one of "otherLine"), an area of "areaStyle"
 // and a path without a style; every element has an id.
 GrxVisualization& linesAreasAndPaths(GrxVisualization& vis) {
