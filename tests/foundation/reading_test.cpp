@@ -1,5 +1,4 @@
 #include "foundation/FoundationSupport.h"
-#include "foundation/ValidatingParser.h"
 #include "support/EngineSupport.h"
 #include "support/ToolRunner.h"
 #include "templates/InstructionWalk.h"
@@ -14,19 +13,12 @@
 
 using namespace foundation_test;
 using engine_test::example;
-using plotaid::detail::DocumentKind;
-using plotaid::detail::ValidatingParser;
 
 namespace {
-
-const ChartException kRefused("refused", "reading_test", 0);
-const std::string kTemplateGrammar = "grxml-template-3.5.xsd";
 
 std::string withoutSchemaLine(const std::string& text) {
     return std::regex_replace(text, std::regex(R"(\s+xsi:schemaLocation="[^"]*")"), "");
 }
-
-std::string chart() { return withoutSchemaLine(example("charts/simple-bar.xml")); }
 
 std::vector<std::string> sampleCharts() {
     std::vector<std::string> names;
@@ -39,63 +31,6 @@ std::vector<std::string> sampleCharts() {
 std::string restyled(const std::string& chartText) {
     ChartTransformer t(chartText);
     return t.applyTemplate(example("templates/presentation.sgt")) ? t.getXML() : "not applied";
-}
-
-// The grammars of the kind are read from the resource folder for the first parse of the process and
-// never again, whichever parser on whichever thread reads, and whatever schema the text names.
-TEST(GrammarPools, EachKindIsReadOncePerFolderForEveryParserOnEveryThread) {
-    TempDir dir;
-    std::filesystem::create_directory_symlink(std::string(PLOTAID_SOURCE_DIR) + "/resources", dir.file("res"));
-    ScopedEnv fresh("PLOTAID_RESOURCE_DIR", dir.file("res"));
-    const DocumentKind kinds[] = {DocumentKind::Chart, DocumentKind::Template, DocumentKind::Data};
-    const std::string texts[] = {chart(), withoutSchemaLine(example("templates/presentation.sgt")),
-                                 withoutSchemaLine(example("data/area.xml"))};
-    unsigned before[3];
-    for (int k = 0; k < 3; ++k)
-        before[k] = ValidatingParser::grammarLoads(kinds[k]);
-    std::vector<int> valid(4, 0);
-    std::vector<std::thread> threads;
-    for (int t = 0; t < 4; ++t)
-        threads.emplace_back([&, t] {
-            ValidatingParser parser;
-            for (int round = 0; round < 3; ++round)
-                for (int k = 0; k < 3; ++k)
-                    valid[t] += parser.parse(texts[k], "test", kRefused, kinds[k]) != nullptr;
-        });
-    for (std::thread& t : threads)
-        t.join();
-    EXPECT_EQ(valid, std::vector<int>(4, 9));
-    for (int k = 0; k < 3; ++k)
-        EXPECT_EQ(ValidatingParser::grammarLoads(kinds[k]), before[k] + 1) << k;
-}
-
-TEST(GrammarPools, TheCallerChoosesTheGrammarAndNoDocumentLeavesADeclarationBehind) {
-    engine_test::Records quiet;
-    const std::string data = withoutSchemaLine(example("data/area.xml"));
-    const std::string wrongClaim = std::regex_replace(example("charts/pie.xml"), std::regex("grxml-2.9.xsd"),
-                                                      kTemplateGrammar);
-    const std::string entity = "<!DOCTYPE visualization [<!ENTITY e \"x\">]>";
-    std::string declared = chart(), used = chart();
-    declared.insert(declared.find("<visualization"), entity);
-    used.insert(used.find("</visualization>"), "<label>&e;</label>");
-    const struct {
-        std::string text;
-        DocumentKind kind;
-        bool valid;
-    } rows[] = {
-        {chart(), DocumentKind::Chart, true},         {chart(), DocumentKind::Data, true},
-        {chart(), DocumentKind::Named, false},        {wrongClaim, DocumentKind::Chart, true},
-        {chart(), DocumentKind::Template, false},     {data, DocumentKind::Data, true},
-        {data, DocumentKind::Chart, false},           {declared, DocumentKind::Chart, true},
-        {used, DocumentKind::Chart, false},           {example("pmml/credit-risk.xml"), DocumentKind::Pmml, true},
-        {withoutSchemaLine(example("pmml/credit-risk.xml")), DocumentKind::TreeDisplay, false},
-        {withoutSchemaLine(example("templates/corporate.sgt")), DocumentKind::Template, true},
-    };
-    ValidatingParser parser;
-    for (const auto& row : rows) {
-        SCOPED_TRACE(row.text.substr(0, 300));
-        EXPECT_EQ(parser.parse(row.text, "test", kRefused, row.kind) != nullptr, row.valid);
-    }
 }
 
 using TemplatesAsWritten = engine_test::EngineTest;
@@ -136,7 +71,8 @@ TEST_F(TemplatesAsWritten, NeedNoSchemaLineAndTextThatIsNotXmlFailsWithTheParser
     ChartTransformer pie(example("charts/pie.xml"));
     EXPECT_FALSE(pie.applyTemplate(readAll(dir.file("notxml.txt"))));
     const std::string charts = std::string(PLOTAID_EXAMPLES_DIR) + "/charts/";
-    const ToolResult single = runTool("apply --chart " + charts + "pie.xml --template " + dir.file("notxml.txt"));
+    const ToolResult single =
+        runTool("apply --chart " + charts + "pie.xml --template " + dir.file("notxml.txt"));
     EXPECT_EQ(single.exitCode, 1);
     EXPECT_NE(single.output.find("notxml.txt:2:19: equal sign expected"), std::string::npos) << single.output;
 }
@@ -145,10 +81,11 @@ TEST_F(TemplatesAsWritten, NeedNoSchemaLineAndTextThatIsNotXmlFailsWithTheParser
 TEST(ToolBatch, RestylesEveryChartIntoTheFolderAndNamesTheFailures) {
     TempDir dir;
     const std::string charts = std::string(PLOTAID_EXAMPLES_DIR) + "/charts/";
-    const std::string tmpl = " --template " + std::string(PLOTAID_EXAMPLES_DIR) + "/templates/presentation.sgt";
+    const std::string tmpl =
+        " --template " + std::string(PLOTAID_EXAMPLES_DIR) + "/templates/presentation.sgt";
     std::ofstream(dir.file("broken.xml")) << "<visualization";
-    const ToolResult batch = runTool("apply" + tmpl + " -o " + dir.file("out") + " -j 2 " + charts + "pie.xml " +
-                                     dir.file("broken.xml") + " " + charts + "simple-bar.xml");
+    const ToolResult batch = runTool("apply" + tmpl + " -o " + dir.file("out") + " -j 2 " + charts +
+                                     "pie.xml " + dir.file("broken.xml") + " " + charts + "simple-bar.xml");
     EXPECT_EQ(batch.exitCode, 1) << batch.output;
     EXPECT_EQ(std::count(batch.output.begin(), batch.output.end(), '\n'), 1) << batch.output;
     EXPECT_NE(batch.output.find("broken.xml"), std::string::npos) << batch.output;
