@@ -170,9 +170,11 @@ using Pool = std::shared_ptr<LoadedPool>;
 // The process's pools, by kind and resource folder. Emptied before Xerces-C terminates.
 class PoolCache {
 public:
+    // Never destroyed: a runtime reference held by a static object may drop the pools at exit,
+    // after function-local statics made later are gone.
     static PoolCache& instance() {
-        static PoolCache cache;
-        return cache;
+        static PoolCache* const cache = new PoolCache;
+        return *cache;
     }
 
     // Null when the grammar cannot be read; errors then says why. The caller holds Xerces-C up.

@@ -5,6 +5,7 @@
 #include "Command.h"
 
 #include "foundation/ValidatingParser.h"
+#include "foundation/XercesRuntime.h"
 #include "templates/InstructionWalk.h"
 #include "templates/TemplateConverter.h"
 
@@ -113,6 +114,8 @@ int runBatch(const Options& o) {
             return failure(kName, o.templatePaths[i] + ": " + error);
 
     // One transformer per chart, each on one thread; the failures are printed in the order given.
+    // Xerces-C, and with it the grammars read once, stays up between charts.
+    const detail::XercesRuntime up;
     std::vector<std::string> failures(o.charts.size());
     std::atomic<std::size_t> next{0};
     const auto work = [&] {
