@@ -2,13 +2,14 @@
 # (scripts/install-deps), configures, builds and runs.
 BUILD      ?= build
 ASAN_BUILD ?= build-asan
+TSAN_BUILD ?= build-tsan
 BENCH_BUILD ?= build-bench
 FUZZ_BUILD ?= build-fuzz
 JOBS       ?= $(shell nproc)
 FUZZ_SECONDS ?= 30
 CMAKE_FLAGS ?=
 
-.PHONY: all deps build test test-sanitize demo bench fuzz fuzz-smoke format clean
+.PHONY: all deps build test test-sanitize test-tsan demo bench fuzz fuzz-smoke format clean
 
 all: build
 
@@ -23,8 +24,9 @@ build: deps $(BUILD)/build.ninja
 	$(if $(CMAKE_FLAGS),cmake -S . -B $(BUILD) -G Ninja $(CMAKE_FLAGS) >/dev/null)
 	cmake --build $(BUILD) -j $(JOBS)
 
+# The threaded label repeats cases the suites already run; it is for test-tsan.
 test: build
-	ctest --test-dir $(BUILD) --output-on-failure -j $(JOBS)
+	ctest --test-dir $(BUILD) --output-on-failure -j $(JOBS) -LE threaded
 
 $(ASAN_BUILD)/build.ninja:
 	cmake -S . -B $(ASAN_BUILD) -G Ninja -DCMAKE_BUILD_TYPE=Debug -DPLOTAID_SANITIZE=ON -DPLOTAID_BUILD_BENCH=OFF $(CMAKE_FLAGS)
@@ -34,6 +36,18 @@ test-sanitize: deps $(ASAN_BUILD)/build.ninja
 	cmake --build $(ASAN_BUILD) -j $(JOBS)
 	ASAN_OPTIONS=detect_leaks=1:abort_on_error=1 UBSAN_OPTIONS=print_stacktrace=1:halt_on_error=1 \
 	  ctest --test-dir $(ASAN_BUILD) --output-on-failure -j $(JOBS) -LE install
+
+TSAN_FLAGS := -fsanitize=thread -fno-omit-frame-pointer
+$(TSAN_BUILD)/build.ninja:
+	cmake -S . -B $(TSAN_BUILD) -G Ninja -DCMAKE_BUILD_TYPE=RelWithDebInfo -DPLOTAID_BUILD_BENCH=OFF \
+	  -DCMAKE_CXX_FLAGS="$(TSAN_FLAGS)" -DCMAKE_C_FLAGS="$(TSAN_FLAGS)" \
+	  -DCMAKE_EXE_LINKER_FLAGS=-fsanitize=thread -DCMAKE_SHARED_LINKER_FLAGS=-fsanitize=thread $(CMAKE_FLAGS)
+
+# Only the threaded cases, and only the program that holds them.
+test-tsan: deps $(TSAN_BUILD)/build.ninja
+	cmake --build $(TSAN_BUILD) -j $(JOBS) --target test_foundation
+	TSAN_OPTIONS=halt_on_error=1:second_deadlock_stack=1 \
+	  ctest --test-dir $(TSAN_BUILD) --output-on-failure -L threaded
 
 demo: build
 	@scripts/demo $(BUILD)/bin/plotaid
@@ -60,4 +74,4 @@ format:
 	@git ls-files '*.cpp' '*.h' | xargs clang-format -i
 
 clean:
-	rm -rf $(BUILD) $(ASAN_BUILD) $(BENCH_BUILD) $(FUZZ_BUILD)
+	rm -rf $(BUILD) $(ASAN_BUILD) $(TSAN_BUILD) $(BENCH_BUILD) $(FUZZ_BUILD)

@@ -23,7 +23,7 @@ inline void applyTemplateLoop(benchmark::State& state, const std::string& chart,
     const ChartException refused("bench input", "bench/template", 0);
     plotaid::detail::ValidatingParser parser;
     for (auto _ : state) {
-        if (!parser.parse(chart, "bench", refused)) {
+        if (!parser.parse(chart, "bench", refused, plotaid::detail::DocumentKind::Chart)) {
             state.SkipWithError("the chart does not validate");
             return;
         }
@@ -43,7 +43,8 @@ inline void applyTemplateFloorLoop(benchmark::State& state, const std::string& c
     const ChartException refused("bench input", "bench/template", 0);
     plotaid::detail::ValidatingParser chartParser, templateParser;
     for (auto _ : state) {
-        if (!chartParser.parse(chart, "bench", refused) || !templateParser.parse(text, "bench", refused)) {
+        if (!chartParser.parse(chart, "bench", refused, plotaid::detail::DocumentKind::Chart) ||
+            !templateParser.parse(text, "bench", refused, plotaid::detail::DocumentKind::Template)) {
             state.SkipWithError("the inputs do not validate");
             return;
         }

@@ -81,7 +81,8 @@ void transformEntire(benchmark::State& state) {
 void transformEntireFloor(benchmark::State& state) {
     plotaid::detail::ValidatingParser parser;
     for (auto _ : state) {
-        if (parser.parse(chartText(), "bench", ChartException("bench chart", "bench", 0)) == nullptr)
+        if (parser.parse(chartText(), "bench", ChartException("bench chart", "bench", 0),
+                         plotaid::detail::DocumentKind::Chart) == nullptr)
             state.SkipWithError("the chart does not parse");
         std::string packed;
         zpack::compressString(dataDocument(), packed);

@@ -74,7 +74,8 @@ void floorInflateParsePrint(benchmark::State& state) {
     for (auto _ : state) {
         std::string text;
         zpack::decompressString(text, packed(), static_cast<unsigned long>(pmml().size()));
-        auto* document = parser.parse(text, "bench", ChartException("bench", "bench", 1));
+        auto* document =
+            parser.parse(text, "bench", ChartException("bench", "bench", 1), plotaid::detail::DocumentKind::Pmml);
         if (document == nullptr) {
             state.SkipWithError("the generated tree does not validate");
             return;

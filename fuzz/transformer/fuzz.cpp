@@ -1,6 +1,8 @@
 // Bytes as the compressed chart, as the compressed data document and as the data stream of a
 // transformer: whatever they hold (not zlib, truncated, inflating to anything), building the
 // transformer and reading the chart back never crashes.
+#include "foundation/XercesRuntime.h"
+
 #include <plotaid/ChartTransformer.h>
 
 #include <zpack/zpack.h>
@@ -31,6 +33,8 @@ void exercise(ChartTransformer& t) {
 } // namespace
 
 extern "C" int LLVMFuzzerInitialize(int*, char***) {
+    // Xerces-C stays up between inputs, as a host keeps it, so the grammars are read once.
+    static const plotaid::detail::XercesRuntime held;
     ::unsetenv("DumpChartXMLPath"); // no error log or dumps: the fuzzer would fill the disk
     // Inputs may inflate enormously; the cap keeps the fuzzer's memory small.
     zpack::setDecompressionLimit(std::size_t(16) << 20);

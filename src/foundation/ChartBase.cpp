@@ -136,8 +136,10 @@ DOMDocument* ChartBase::createGrxDocument(const XMLCh* encoding) {
 }
 
 DOMDocument* ChartBase::parseDocument(const std::string& text) {
+    // Builders read charts and data documents here; the data grammar holds the chart grammar too.
     return parser_->parser.parse(text, "ChartBase",
-                                 ChartException("parseDocument fatal error while parsing", kFile, 1105));
+                                 ChartException("parseDocument fatal error while parsing", kFile, 1105),
+                                 plotaid::detail::DocumentKind::Data);
 }
 
 bool ChartBase::ValidXML(const std::string& text) {

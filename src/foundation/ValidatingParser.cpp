@@ -10,6 +10,7 @@
 #include <xercesc/dom/DOMDocument.hpp>
 #include <xercesc/dom/DOMException.hpp>
 #include <xercesc/framework/MemBufInputSource.hpp>
+#include <xercesc/framework/XMLGrammarPoolImpl.hpp>
 #include <xercesc/internal/XMLScanner.hpp>
 #include <xercesc/parsers/XercesDOMParser.hpp>
 #include <xercesc/sax/Locator.hpp>
@@ -21,7 +22,14 @@
 #include <xercesc/util/XMLUni.hpp>
 #include <xercesc/validators/DTD/DTDEntityDecl.hpp>
 
+#include <scratchloc/PathFactory.h>
+
+#include <array>
+#include <atomic>
+#include <map>
+#include <mutex>
 #include <optional>
+#include <utility>
 
 using namespace XERCES_CPP_NAMESPACE;
 
@@ -41,6 +49,9 @@ bool isDatatypeError(unsigned code, const XMLCh* domain, XMLErrorReporter::ErrTy
 
 class Parser final : public XercesDOMParser {
 public:
+    explicit Parser(XMLGrammarPool* pool = nullptr)
+        : XercesDOMParser(nullptr, XMLPlatformUtils::fgMemoryManager, pool) {}
+
     void error(const unsigned int code, const XMLCh* const domain, const XMLErrorReporter::ErrTypes type,
                const XMLCh* const text, const XMLCh* const systemId, const XMLCh* const publicId,
                const XMLFileLoc line, const XMLFileLoc column) override {
@@ -116,6 +127,127 @@ std::string describe(const SAXParseException& e) {
            std::to_string(e.getColumnNumber()) + ": " + toHost(e.getMessage());
 }
 
+constexpr std::size_t kKinds = static_cast<std::size_t>(DocumentKind::Pmml) + 1;
+
+// The grammar file each kind starts from; what it includes and imports comes along.
+const char* grammarFile(DocumentKind kind) {
+    switch (kind) {
+    case DocumentKind::Named:
+        break;
+    case DocumentKind::Chart:
+        return "grxml-2.9.xsd";
+    case DocumentKind::Template:
+        return "grxml-template-3.5.xsd";
+    case DocumentKind::ConvertedTemplate:
+        return "grxml-template-1.0.xsd";
+    case DocumentKind::Data:
+        return "grxml-data-2.1.xsd";
+    case DocumentKind::TreeDisplay:
+        return "treeview-1.0.xsd";
+    case DocumentKind::Pmml:
+        return "pmml-2-1.xsd";
+    }
+    return nullptr;
+}
+
+std::string resourceFolder() {
+    const scratchloc::PathFinder* finder =
+        scratchloc::PathFactory::getPathInstance(scratchloc::PathFactory::ResourceFolder);
+    return finder ? finder->getPath() : std::string();
+}
+
+// A locked pool: parsers only read it, apart from the namespace names they meet, which a locked
+// pool keeps in a string pool of its own behind a lock. Those accumulate over hostile documents,
+// so a pool that has taken in this many is replaced.
+struct LoadedPool {
+    static constexpr unsigned kMaxNewNames = 10000;
+    XMLGrammarPoolImpl pool{XMLPlatformUtils::fgMemoryManager};
+    unsigned names = 0;
+    bool crowded() { return pool.getURIStringPool()->getStringCount() > names + kMaxNewNames; }
+};
+using Pool = std::shared_ptr<LoadedPool>;
+
+// The process's pools, by kind and resource folder. Emptied before Xerces-C terminates.
+class PoolCache {
+public:
+    // Never destroyed: a runtime reference held by a static object may drop the pools at exit,
+    // after function-local statics made later are gone.
+    static PoolCache& instance() {
+        static PoolCache* const cache = new PoolCache;
+        return *cache;
+    }
+
+    // Null when the grammar cannot be read; errors then says why. The caller holds Xerces-C up.
+    Pool get(DocumentKind kind, const std::string& folder, std::vector<std::string>& errors) {
+        const std::lock_guard<std::mutex> guard(lock_);
+        Pool& slot = pools_[{kind, folder}];
+        if (!slot) {
+            slot = load(kind, errors);
+            if (!slot) {
+                pools_.erase({kind, folder});
+                return nullptr;
+            }
+            ++loads_[static_cast<std::size_t>(kind)];
+        }
+        return slot;
+    }
+
+    void retire(DocumentKind kind, const std::string& folder, const Pool& pool) {
+        const std::lock_guard<std::mutex> guard(lock_);
+        const auto found = pools_.find({kind, folder});
+        if (found != pools_.end() && found->second == pool)
+            pools_.erase(found);
+    }
+
+    unsigned loads(DocumentKind kind) const noexcept { return loads_[static_cast<std::size_t>(kind)]; }
+
+private:
+    PoolCache() { XercesRuntime::beforeTermination(&PoolCache::dropAll); }
+
+    static void dropAll() {
+        PoolCache& cache = instance();
+        const std::lock_guard<std::mutex> guard(cache.lock_);
+        cache.pools_.clear();
+    }
+
+    static Pool load(DocumentKind kind, std::vector<std::string>& errors) {
+        Pool loaded = std::make_shared<LoadedPool>();
+        RecordingHandler handler(errors);
+        try {
+            Parser loader(&loaded->pool);
+            loader.setDoNamespaces(true);
+            loader.setDoSchema(true);
+            loader.setHandleMultipleImports(true);
+            loader.setErrorHandler(&handler);
+            loader.setEntityResolver(&handler);
+            loader.setDisableDefaultEntityResolution(true);
+            // The resolver maps the name after the last '/' into the schema folder.
+            const WideText id = toWide((std::string("http://plotaid.org/grxml/") + grammarFile(kind)).c_str());
+            std::unique_ptr<InputSource> source(handler.resolveEntity(nullptr, id.get()));
+            if (!source || loader.loadGrammar(*source, Grammar::SchemaGrammarType, true) == nullptr) {
+                errors.push_back(std::string("the grammar ") + grammarFile(kind) + " cannot be read");
+                return nullptr;
+            }
+        } catch (const SAXParseException& e) {
+            errors.push_back(describe(e));
+            return nullptr;
+        } catch (const XMLException& e) {
+            errors.push_back(toHost(e.getMessage()));
+            return nullptr;
+        } catch (...) {
+            errors.push_back(std::string("the grammar ") + grammarFile(kind) + " cannot be read");
+            return nullptr;
+        }
+        loaded->pool.lockPool();
+        loaded->names = loaded->pool.getURIStringPool()->getStringCount();
+        return loaded;
+    }
+
+    std::mutex lock_;
+    std::map<std::pair<DocumentKind, std::string>, Pool> pools_;
+    std::array<std::atomic<unsigned>, kKinds> loads_{};
+};
+
 } // namespace
 
 void DocumentRelease::operator()(DOMDocument* document) const noexcept {
@@ -128,19 +260,63 @@ void DocumentRelease::operator()(DOMDocument* document) const noexcept {
 }
 
 struct ValidatingParser::Impl {
+    // One parser per kind, made when first needed, with the pool of the folder it was made for.
+    struct Slot {
+        std::string folder;
+        Pool pool; // outlives the parser below
+        std::optional<Parser> parser;
+    };
+
     // Declared first: Xerces-C outlives everything below.
     XercesRuntime runtime;
     std::vector<std::string> errors;
     RecordingHandler handler{errors};
     SecurityManager security;
-    std::optional<Parser> parser;
+    std::array<Slot, kKinds> slots;
+    Parser* last = nullptr;
     DOMDocument* document = nullptr;
 
-    Impl() {
-        if (!runtime.ready())
+    Impl() { security.setEntityExpansionLimit(kEntityExpansionLimit); }
+
+    // Null (with errors) when Xerces-C is down or the kind's grammar cannot be read.
+    Parser* parserFor(DocumentKind kind) {
+        if (!runtime.ready()) {
+            errors.push_back("the XML parser library is not available");
+            return nullptr;
+        }
+        Slot& slot = slots[static_cast<std::size_t>(kind)];
+        if (kind == DocumentKind::Named) {
+            if (!slot.parser)
+                configure(slot.parser.emplace());
+            return &*slot.parser;
+        }
+        std::string folder = resourceFolder();
+        if (slot.parser && slot.folder == folder)
+            return &*slot.parser;
+        slot.parser.reset();
+        slot.pool = PoolCache::instance().get(kind, folder, errors);
+        if (!slot.pool)
+            return nullptr;
+        slot.folder = std::move(folder);
+        Parser& p = slot.parser.emplace(&slot.pool->pool);
+        configure(p);
+        p.useCachedGrammarInParse(true);
+        // A document's own DTD or foreign schema stays with that document.
+        p.cacheGrammarFromParse(false);
+        return &p;
+    }
+
+    // Between parses only: the parser's document dies with it.
+    void retireIfCrowded(DocumentKind kind) {
+        Slot& slot = slots[static_cast<std::size_t>(kind)];
+        if (!slot.pool || !slot.pool->crowded())
             return;
-        security.setEntityExpansionLimit(kEntityExpansionLimit);
-        Parser& p = parser.emplace();
+        slot.parser.reset();
+        PoolCache::instance().retire(kind, slot.folder, slot.pool);
+        slot.pool.reset();
+    }
+
+    void configure(Parser& p) {
         p.setValidationScheme(XercesDOMParser::Val_Always);
         p.setDoNamespaces(true);
         p.setDoSchema(true);
@@ -158,21 +334,27 @@ ValidatingParser::ValidatingParser() : impl_(std::make_unique<Impl>()) {}
 ValidatingParser::~ValidatingParser() = default;
 
 DOMDocument* ValidatingParser::parse(std::string_view text, const char* systemId,
-                                     const ChartException& failure) {
+                                     const ChartException& failure, DocumentKind kind) {
     Impl& in = *impl_;
     in.errors.clear();
     in.document = nullptr;
-    if (!in.parser) {
-        in.errors.push_back("the XML parser library is not available");
-    } else {
+    if (in.last != nullptr) {
+        // The previous document dies here unless it was adopted.
         try {
-            // The previous document dies here unless it was adopted.
-            in.parser->resetDocumentPool();
+            in.last->resetDocumentPool();
+        } catch (...) {
+        }
+        in.last = nullptr;
+    }
+    in.retireIfCrowded(kind);
+    if (Parser* parser = in.parserFor(kind)) {
+        try {
             static const char nothing = 0;
             MemBufInputSource source(reinterpret_cast<const XMLByte*>(text.empty() ? &nothing : text.data()),
                                      text.size(), systemId ? systemId : "");
-            in.parser->parse(source);
-            in.document = in.parser->getDocument();
+            in.last = parser;
+            parser->parse(source);
+            in.document = parser->getDocument();
             if (in.document != nullptr)
                 return in.document;
             in.errors.push_back("no document");
@@ -192,9 +374,10 @@ DOMDocument* ValidatingParser::parse(std::string_view text, const char* systemId
             in.errors.push_back("unknown failure");
         }
         try {
-            in.parser->resetDocumentPool();
+            parser->resetDocumentPool();
         } catch (...) {
         }
+        in.last = nullptr;
     }
     try {
         ChartBase::printString(std::string(text), "parseError_", ".xml", 0, ChartBase::PRINT_XML_WITH_POPUPS);
@@ -206,14 +389,18 @@ DOMDocument* ValidatingParser::parse(std::string_view text, const char* systemId
 
 OwnedDocument ValidatingParser::adoptDocument() {
     Impl& in = *impl_;
-    if (in.document == nullptr || !in.parser)
+    if (in.document == nullptr || in.last == nullptr)
         return OwnedDocument();
     in.document = nullptr;
-    return OwnedDocument(in.parser->adoptDocument());
+    return OwnedDocument(in.last->adoptDocument());
 }
 
 const std::vector<std::string>& ValidatingParser::lastErrors() const noexcept {
     return impl_->errors;
+}
+
+unsigned ValidatingParser::grammarLoads(DocumentKind kind) noexcept {
+    return PoolCache::instance().loads(kind);
 }
 
 } // namespace plotaid::detail

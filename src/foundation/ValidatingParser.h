@@ -19,6 +19,20 @@ XERCES_CPP_NAMESPACE_END
 
 namespace plotaid::detail {
 
+// What the caller reads. Each kind but Named is checked against its bundled grammar, whatever schema
+// the text names or whether it names one: charts and templates share a namespace, so the caller,
+// not the document, says which grammar applies. The grammars of a kind are loaded once per process
+// and resource folder, then shared read-only by every parser on every thread.
+enum class DocumentKind {
+    Named,             // whatever grammar the text names, read for this parse alone
+    Chart,             // grxml-2.9
+    Template,          // grxml-template-3.5, the form people write
+    ConvertedTemplate, // grxml-template-1.0, the form the converter writes
+    Data,              // grxml-data-2.1, and the chart grammar it imports (so charts pass too)
+    TreeDisplay,       // treeview-1.0
+    Pmml,              // pmml-2-1
+};
+
 // The library's one way to parse XML. The parser always validates (namespaces and schemas on,
 // ignorable white space dropped), reads schemas and other entities only from the resource folder
 // through ChartErrorHandler, limits entity expansion, and lets values of a wrong data type pass:
@@ -48,7 +62,8 @@ public:
     // On failure returns null after dumping the text as parseError_00.xml (dump kind 9) and
     // logging `failure`; lastErrors() then says why.
     XERCES_CPP_NAMESPACE::DOMDocument* parse(std::string_view text, const char* systemId,
-                                             const ChartException& failure);
+                                             const ChartException& failure,
+                                             DocumentKind kind = DocumentKind::Named);
 
     // Hands the document of the last successful parse to the caller; null when there is none.
     OwnedDocument adoptDocument();
@@ -56,6 +71,9 @@ public:
     // The texts (host encoding) of what stopped the last parse, such as
     // "ChartBase:3:7: no declaration found for element 'bogus'"; empty after a successful parse.
     const std::vector<std::string>& lastErrors() const noexcept;
+
+    // How many grammar sets this process has loaded for the kind (once per resource folder).
+    static unsigned grammarLoads(DocumentKind kind) noexcept;
 
 private:
     struct Impl;

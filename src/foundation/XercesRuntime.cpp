@@ -5,6 +5,7 @@
 #include <xercesc/util/PlatformUtils.hpp>
 #include <xercesc/util/XMLException.hpp>
 
+#include <cstddef>
 #include <mutex>
 
 using namespace XERCES_CPP_NAMESPACE;
@@ -21,6 +22,9 @@ std::mutex& runtimeLock() {
 }
 unsigned gReferences = 0;
 bool gFailed = false;
+// A fixed table: registering happens while Xerces-C is up, and must not fail.
+constexpr std::size_t kMaxDrops = 4;
+void (*gDrops[kMaxDrops])() = {};
 
 bool acquire() noexcept {
     const std::lock_guard<std::mutex> guard(runtimeLock());
@@ -48,6 +52,14 @@ void release() noexcept {
     const std::lock_guard<std::mutex> guard(runtimeLock());
     if (gReferences == 0 || --gReferences > 0)
         return;
+    for (std::size_t i = kMaxDrops; i-- > 0;) {
+        if (gDrops[i] == nullptr)
+            continue;
+        try {
+            gDrops[i]();
+        } catch (...) {
+        }
+    }
     try {
         XMLPlatformUtils::Terminate();
     } catch (const XMLException& e) {
@@ -66,6 +78,18 @@ XercesRuntime::XercesRuntime(const XercesRuntime& other) noexcept : ready_(other
 XercesRuntime::~XercesRuntime() {
     if (ready_)
         release();
+}
+
+void XercesRuntime::beforeTermination(void (*drop)()) noexcept {
+    const std::lock_guard<std::mutex> guard(runtimeLock());
+    for (auto& slot : gDrops) {
+        if (slot == drop)
+            return;
+        if (slot == nullptr) {
+            slot = drop;
+            return;
+        }
+    }
 }
 
 unsigned XercesRuntime::references() noexcept {

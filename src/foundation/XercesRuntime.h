@@ -22,6 +22,11 @@ public:
     // How many references the process holds now.
     static unsigned references() noexcept;
 
+    // Has `drop` run just before the last reference terminates Xerces-C, for caches of Xerces
+    // objects, which must not outlive it. It runs under the runtime's lock: it must not take a
+    // reference itself. Registering the same function again changes nothing.
+    static void beforeTermination(void (*drop)()) noexcept;
+
 private:
     bool ready_;
 };

@@ -18,8 +18,8 @@ using namespace XERCES_CPP_NAMESPACE;
 namespace {
 
 const char* const kFile = "backend/chartxml/plotaid/src/templates/charttemplate";
-// Current-form templates name a schema file starting with this; any other text is earlier-form.
-const char* const kCurrentFormMarker = "grxml-template-";
+// The converted text always names this grammar.
+const char* const kConvertedGrammar = "grxml-template-1.0.xsd";
 
 } // namespace
 
@@ -39,26 +39,35 @@ ChartTemplate::~ChartTemplate() {
 }
 
 DOMElement* ChartTemplate::parseTemplate(const std::string& text) {
-    const bool currentForm = text.find(kCurrentFormMarker) != std::string::npos;
-    DOMDocument* parsed = parser_->parser.parse(
+    using plotaid::detail::DocumentKind;
+    std::string notXml;
+    const DocumentKind kind = plotaid::detail::templateKind(text, notXml);
+    parser_->failureLogged = false;
+    // Text that is not XML is no template of any form, so there is nothing to convert.
+    if (!notXml.empty())
+        return nullptr;
+    const bool currentForm = kind != DocumentKind::Named;
+    plotaid::detail::ValidatingParser& parser = parser_->parser;
+    DOMDocument* parsed = parser.parse(
         text, "ChartTemplate",
         ChartException(
             (currentForm ? "Failed to parse template " : "Failed to parse earlier-form template ") + text,
-            kFile, 59));
+            kFile, 59),
+        kind);
     parser_->failureLogged = currentForm && parsed == nullptr;
     if (!currentForm) {
-        // The converted text always carries the marker, so this recursion ends here.
+        // The converted text is read as the current form, so this recursion ends here.
         const std::string converted = plotaid::detail::convertTemplate(parsed);
         ChartBase::printString(converted, "template_converted_", ".sgt",
                                plotaid::detail::nextConversionCount(), ChartBase::PRINT_CONVERTED_TEMPLATE);
-        if (converted.find(kCurrentFormMarker) == std::string::npos)
+        if (converted.find(kConvertedGrammar) == std::string::npos)
             return nullptr;
         return parseTemplate(converted);
     }
     if (parsed == nullptr)
         return nullptr;
     DOMElement* root = parsed->getDocumentElement();
-    parser_->document = parser_->parser.adoptDocument();
+    parser_->document = parser.adoptDocument();
     return root;
 }
 

@@ -125,7 +125,8 @@ bool ChartTransformer::buildVisualization(const std::string& text) {
     // builder's parser is reused for data documents.
     plotaid::detail::ValidatingParser parser;
     DOMDocument* parsed = parser.parse(
-        text, "ChartBase", ChartException("parseDocument fatal error while parsing", kBaseFile, 1105));
+        text, "ChartBase", ChartException("parseDocument fatal error while parsing", kBaseFile, 1105),
+        plotaid::detail::DocumentKind::Chart);
     if (parsed == nullptr)
         return false;
     DOMElement* root = parsed->getDocumentElement();

@@ -115,6 +115,11 @@ const char* const TreeTransformer::s_membufid = "TreeTransformer";
 struct TreeTransformer::Impl {
     ValidatingParser parser;
     OwnedDocument display;
+
+    DOMDocument* parse(const std::string& text, DocumentKind kind) {
+        return parser.parse(text, s_membufid,
+                            ChartException("TreeTransformer::parseDocument() fatal error", kFile, 443), kind);
+    }
     OwnedDocument pmml;
     // Texts that fail are reported once, when they are parsed; the option operations then do
     // nothing rather than repeat the report on every call.
@@ -122,7 +127,8 @@ struct TreeTransformer::Impl {
     // Takes the display settings over from the parser; anything but a "displaySettings" root of
     // the tree-view namespace is refused, since the options would land in a foreign document.
     static void load(TreeTransformer& self, const std::string& settings, std::uint32_t line) {
-        if (self.parseDocument(settings.empty() ? self.SetupDisplayData() : settings) == nullptr)
+        if (self.impl_->parse(settings.empty() ? self.SetupDisplayData() : settings,
+                              DocumentKind::TreeDisplay) == nullptr)
             return;
         OwnedDocument document = self.impl_->parser.adoptDocument();
         if (!hasRoot(document.get(), kDisplaySettings, kTreeViewNamespace)) {
@@ -393,7 +399,7 @@ bool TreeTransformer::applyTemplate(const std::string& templateText) {
     if (templateText.empty())
         return false;
     return guarded(kFile, 480, "TreeTransformer::applyTemplate() fatal error", false, [&] {
-        if (parseDocument(templateText) == nullptr)
+        if (impl_->parse(templateText, DocumentKind::TreeDisplay) == nullptr)
             return false;
         const OwnedDocument templ = impl_->parser.adoptDocument();
         // A foreign root would smuggle elements the display grammar does not know.
@@ -463,7 +469,7 @@ DOMDocument* TreeTransformer::setupPMMLDOM() {
                        std::string text;
                        if (!decompress(compressedPmml_, pmmlLength_, text))
                            throw ChartException("setupPMMLDOM fatal error", kFile, 971);
-                       if (parseDocument(text) == nullptr)
+                       if (impl_->parse(text, DocumentKind::Pmml) == nullptr)
                            return nullptr;
                        OwnedDocument document = impl_->parser.adoptDocument();
                        if (!hasRoot(document.get(), kPMML, kPmmlNamespace))

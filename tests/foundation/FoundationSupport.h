@@ -21,25 +21,17 @@ public:
 
 private:
     TempDir dir_;
-    ScopedEnv path_;
-    ScopedEnv options_;
+    ScopedEnv path_, options_;
 };
 
 // Works in another folder for the lifetime of the object.
-class ScopedCwd {
-public:
-    explicit ScopedCwd(const std::string& folder) : old_(std::filesystem::current_path()) {
-        std::filesystem::current_path(folder);
-    }
+struct ScopedCwd {
+    explicit ScopedCwd(const std::string& folder) { std::filesystem::current_path(folder); }
     ~ScopedCwd() {
         std::error_code ignored;
-        std::filesystem::current_path(old_, ignored);
+        std::filesystem::current_path(old, ignored);
     }
-    ScopedCwd(const ScopedCwd&) = delete;
-    ScopedCwd& operator=(const ScopedCwd&) = delete;
-
-private:
-    std::filesystem::path old_;
+    const std::filesystem::path old = std::filesystem::current_path();
 };
 
 inline std::string testData(const std::string& name) {

@@ -32,12 +32,13 @@ void resetHost() {
 
 // One host format converted into a fresh format element. `expect` lists, split by '|': "name" (is
 // "true"), "!name" (not "true"), "-name" (absent), "+name" (present), "name=text", "name#number"
-// (absent counts as 0).
+// (absent counts as 0). A row with a currency sets that custom currency of the host first.
 struct Row {
     int type, width, decimals;
     const char16_t* expect;
     void (*setHost)() = nullptr;
     Convert convert = &ChartBase::addFormat;
+    kovar::customCurrency currency{};
 };
 
 class Formats : public engine_test::EngineTest {
@@ -62,38 +63,31 @@ protected:
         fresh();
         if (row.setHost)
             row.setHost();
-        const std::string where = "type " + std::to_string(row.type) + " width " + std::to_string(row.width) +
-                                  " decimals " + std::to_string(row.decimals);
-        SCOPED_TRACE(where);
+        if (row.type >= 33 && row.type <= 37)
+            kovar::currencyFormat::SetCCX(row.type - 33, row.currency);
+        SCOPED_TRACE("type " + std::to_string(row.type) + " width " + std::to_string(row.width) +
+                     " decimals " + std::to_string(row.decimals));
         ASSERT_TRUE(row.convert(*format, host(row.type, row.width, row.decimals)));
         const Attributes all = attributes();
         const std::u16string wanted = row.expect;
-        for (std::size_t from = 0; from <= wanted.size();) {
-            const std::size_t bar = std::min(wanted.find(u'|', from), wanted.size());
+        for (std::size_t from = 0, bar = 0; from <= wanted.size(); from = bar + 1) {
+            bar = std::min(wanted.find(u'|', from), wanted.size());
             std::u16string item = wanted.substr(from, bar - from);
-            from = bar + 1;
-            const char16_t mode = item[0] == u'!' || item[0] == u'-' || item[0] == u'+' ? item[0] : 0;
-            if (mode)
-                item.erase(0, 1);
+            const char16_t mode = std::u16string(u"!-+").find(item[0]) != std::u16string::npos ? item[0] : 0;
+            item.erase(0, mode ? 1 : 0);
             const std::size_t eq = item.find_first_of(u"=#");
-            const std::u16string name = item.substr(0, eq);
-            const auto found = all.find(name);
+            const auto found = all.find(item.substr(0, eq));
             const std::u16string value = found == all.end() ? u"" : found->second;
-            const std::string shown(name.begin(), name.end());
-            if (mode == u'-')
-                EXPECT_TRUE(found == all.end()) << shown;
-            else if (mode == u'+')
-                EXPECT_TRUE(found != all.end()) << shown;
-            else if (mode == u'!')
-                EXPECT_NE(value, u"true") << shown;
-            else if (eq == std::u16string::npos)
-                EXPECT_EQ(value, u"true") << shown;
+            SCOPED_TRACE(std::string(item.begin(), item.end()));
+            if (mode == u'-' || mode == u'+')
+                EXPECT_EQ(found == all.end(), mode == u'-');
+            else if (mode == u'!' || eq == std::u16string::npos)
+                EXPECT_EQ(value == u"true", mode != u'!');
             else if (item[eq] == u'=')
-                EXPECT_EQ(value, item.substr(eq + 1)) << shown;
+                EXPECT_EQ(value, item.substr(eq + 1));
             else
                 EXPECT_EQ(value.empty() ? 0.0 : std::stod(std::string(value.begin(), value.end())),
-                          std::stod(std::string(item.begin() + eq + 1, item.end())))
-                    << shown;
+                          std::stod(std::string(item.begin() + eq + 1, item.end())));
         }
     }
 
@@ -200,29 +194,26 @@ TEST_F(Formats, DatesAndTimes) {
 }
 
 TEST_F(Formats, CustomCurrenciesReadTheirOwnDefinition) {
+    const Convert add = &ChartBase::addFormat;
     const Row rows[] = {
-        {33, 10, 2,
+        {33,
+         10,
+         2,
          u"negativesInParentheses|-negativesOutside|-prefix|-suffix|separators=.,/:|useGrouping|"
          u"maximumFractionDigits#2",
-         [] {
-             kovar::currencyFormat::SetCCX(0, {"", "", "(", ")", "."});
-         }},
-        {37, 10, 1, u"negativesOutside|-negativesInParentheses|prefix=\u20AC |suffix= EUR|separators=,./:",
-         [] {
-             kovar::currencyFormat::SetCCX(4, {"\xE2\x82\xAC ", " EUR", "-", "", ","});
-         }},
-        {34, 10, 0, u"negativesInParentheses",
-         [] {
-             kovar::currencyFormat::SetCCX(1, {"", "", "", "-", "."});
-         }},
-        {35, 10, 0, u"-negativesInParentheses|-negativesOutside",
-         [] {
-             kovar::currencyFormat::SetCCX(2, {"", "", "", "", "."});
-         }},
-        {36, 10, 0, u"prefix=C3",
-         [] {
-             kovar::currencyFormat::SetCCX(3, {"C3", "", "-", "", "."});
-         }},
+         nullptr,
+         add,
+         {"", "", "(", ")", "."}},
+        {37,
+         10,
+         1,
+         u"negativesOutside|-negativesInParentheses|prefix=\u20AC |suffix= EUR|separators=,./:",
+         nullptr,
+         add,
+         {"\xE2\x82\xAC ", " EUR", "-", "", ","}},
+        {34, 10, 0, u"negativesInParentheses", nullptr, add, {"", "", "", "-", "."}},
+        {35, 10, 0, u"-negativesInParentheses|-negativesOutside", nullptr, add, {"", "", "", "", "."}},
+        {36, 10, 0, u"prefix=C3", nullptr, add, {"C3", "", "-", "", "."}},
     };
     for (const Row& row : rows)
         check(row);

@@ -143,8 +143,8 @@ bool read(const std::string& path, std::string& text, int& rc) {
 // The model must validate, or the library hands it back unchanged and the output would not be PMML.
 bool validModel(const std::string& text, std::string& reason) {
     plotaid::detail::ValidatingParser parser;
-    if (parser.parse(text, TreeTransformer::s_membufid, ChartException("PMML refused", "plotaid tree", 0)) !=
-        nullptr)
+    if (parser.parse(text, TreeTransformer::s_membufid, ChartException("PMML refused", "plotaid tree", 0),
+                     plotaid::detail::DocumentKind::Pmml) != nullptr)
         return true;
     reason = parser.lastErrors().empty() ? "not valid PMML 2.1" : parser.lastErrors().front();
     return false;

@@ -1,0 +1,125 @@
+#include "foundation/FoundationSupport.h"
+#include "support/EngineSupport.h"
+#include "support/ToolRunner.h"
+#include "templates/InstructionWalk.h"
+
+#include <plotaid/ChartTemplate.h>
+#include <plotaid/ChartTransformer.h>
+
+#include <algorithm>
+#include <fstream>
+#include <regex>
+#include <thread>
+
+using namespace foundation_test;
+using engine_test::example;
+
+namespace {
+
+std::string withoutSchemaLine(const std::string& text) {
+    return std::regex_replace(text, std::regex(R"(\s+xsi:schemaLocation="[^"]*")"), "");
+}
+
+std::vector<std::string> sampleCharts() {
+    std::vector<std::string> names;
+    for (const auto& e : std::filesystem::directory_iterator(std::string(PLOTAID_EXAMPLES_DIR) + "/charts"))
+        names.push_back(e.path().filename().string());
+    std::sort(names.begin(), names.end());
+    return names;
+}
+
+std::string restyled(const std::string& chartText) {
+    ChartTransformer t(chartText);
+    return t.applyTemplate(example("templates/presentation.sgt")) ? t.getXML() : "not applied";
+}
+
+using TemplatesAsWritten = engine_test::EngineTest;
+
+// A template is the current form by its root and instructions, schema line or not; text that is not
+// XML is no template of any form, and says where it stops being XML.
+TEST_F(TemplatesAsWritten, NeedNoSchemaLineAndTextThatIsNotXmlFailsWithTheParsersWords) {
+    const std::string bare = withoutSchemaLine(example("templates/bar-tidy.sgt"));
+    const std::string open = "<template xmlns=\"http://plotaid.org/grxml\">";
+    const struct {
+        std::string text;
+        bool read;
+        std::size_t instructions;
+    } rows[] = {
+        {bare, true, 5},
+        {std::regex_replace(bare, std::regex(R"(\s+xmlns:xsi="[^"]*")"), ""), true, 5},
+        {open + "<madeUp/></template>", true, 0}, // no instruction: the earlier form, converted
+        {"<template xmlns=\"http://plotaid.org/other\"><setStyle type=\"bar\"/></template>", true, 0},
+        {open + "<setStyle>", false, 0},
+        {"this is not XML", false, 0},
+    };
+    for (const auto& row : rows) {
+        SCOPED_TRACE(row.text.substr(0, 200));
+        engine_test::Chart chart = engine_test::Chart::parse(example("charts/simple-bar.xml"));
+        ChartTemplate t(*chart.vis, nullptr);
+        plotaid::detail::WalkReport report;
+        engine_test::Records records;
+        EXPECT_EQ(t.setTemplate(row.text), row.read);
+        t.applyTemplate();
+        EXPECT_EQ(report.outcomes().size(), row.instructions);
+        const auto& all = records.collector.records();
+        EXPECT_EQ(std::any_of(all.begin(), all.end(),
+                              [](const auto& r) { return r.kind == "Fatal Error -- SAX Parser:"; }),
+                  !row.read);
+    }
+    TempDir dir;
+    std::ofstream(dir.file("notxml.txt")) << "<template>\n  this is <not XML";
+    ChartTransformer pie(example("charts/pie.xml"));
+    EXPECT_FALSE(pie.applyTemplate(readAll(dir.file("notxml.txt"))));
+    const std::string charts = std::string(PLOTAID_EXAMPLES_DIR) + "/charts/";
+    const ToolResult single =
+        runTool("apply --chart " + charts + "pie.xml --template " + dir.file("notxml.txt"));
+    EXPECT_EQ(single.exitCode, 1);
+    EXPECT_NE(single.output.find("notxml.txt:2:19: equal sign expected"), std::string::npos) << single.output;
+}
+
+// The batch form writes each chart as the single form does, and one line per chart that failed.
+TEST(ToolBatch, RestylesEveryChartIntoTheFolderAndNamesTheFailures) {
+    TempDir dir;
+    const std::string charts = std::string(PLOTAID_EXAMPLES_DIR) + "/charts/";
+    const std::string tmpl =
+        " --template " + std::string(PLOTAID_EXAMPLES_DIR) + "/templates/presentation.sgt";
+    std::ofstream(dir.file("broken.xml")) << "<visualization";
+    const ToolResult batch = runTool("apply" + tmpl + " -o " + dir.file("out") + " -j 2 " + charts +
+                                     "pie.xml " + dir.file("broken.xml") + " " + charts + "simple-bar.xml");
+    EXPECT_EQ(batch.exitCode, 1) << batch.output;
+    EXPECT_EQ(std::count(batch.output.begin(), batch.output.end(), '\n'), 1) << batch.output;
+    EXPECT_NE(batch.output.find("broken.xml"), std::string::npos) << batch.output;
+    for (const char* name : {"pie.xml", "simple-bar.xml"}) {
+        EXPECT_EQ(runTool("apply --chart " + charts + name + tmpl + " -o " + dir.file(name)).exitCode, 0);
+        EXPECT_EQ(readAll(dir.file("out/" + std::string(name))), readAll(dir.file(name))) << name;
+    }
+    EXPECT_FALSE(std::filesystem::exists(dir.file("out/broken.xml")));
+    EXPECT_EQ(runTool("apply" + tmpl + " -o " + dir.file("out") + " -j 2 " + charts + "pie.xml").exitCode, 0);
+}
+
+// One transformer per thread: four threads over the sample charts give the single-thread output.
+TEST(Threads, FourTransformersAtOnceWriteWhatOneWrites) {
+    const std::vector<std::string> names = sampleCharts();
+    std::vector<std::string> texts, expected;
+    for (const std::string& n : names) {
+        texts.push_back(example("charts/" + n));
+        expected.push_back(restyled(texts.back()));
+    }
+    std::vector<std::vector<std::string>> got(4, std::vector<std::string>(names.size()));
+    std::vector<std::thread> threads;
+    for (std::size_t t = 0; t < got.size(); ++t)
+        threads.emplace_back([&, t] {
+            engine_test::Records own;
+            for (std::size_t i = 0; i < names.size(); ++i) {
+                const std::size_t at = (i + t * 3) % names.size(); // each thread starts elsewhere
+                got[t][at] = restyled(texts[at]);
+            }
+        });
+    for (std::thread& t : threads)
+        t.join();
+    for (std::size_t t = 0; t < got.size(); ++t)
+        for (std::size_t i = 0; i < names.size(); ++i)
+            EXPECT_EQ(got[t][i], expected[i]) << names[i] << " on thread " << t;
+}
+
+} // namespace
