@@ -47,13 +47,6 @@ inline bool readInto(VarDataProcessor& store, const std::string& bytes) {
     return store.ReadStreamData(copy.empty() ? nullptr : &copy[0], static_cast<unsigned>(copy.size()));
 }
 
-inline std::uint32_t u32At(const std::string& raw, std::size_t at) {
-    std::uint32_t v = 0;
-    for (int i = 3; i >= 0; --i)
-        v = v << 8 | static_cast<unsigned char>(raw.at(at + i));
-    return v;
-}
-
 inline void appendU32(std::string& out, std::initializer_list<std::uint32_t> values, bool bigEndian = false) {
     for (std::uint32_t v : values)
         for (int i = 0; i < 4; ++i)
@@ -67,10 +60,9 @@ inline void appendDouble(std::string& out, double v, bool bigEndian = false) {
         out += static_cast<char>(b[bigEndian ? 7 - i : i]);
 }
 
+// A name in its fixed-size field, zero-padded.
 inline void appendField(std::string& out, const std::string& name, std::size_t size) {
-    std::string field = name;
-    field.resize(size, '\0');
-    out += field;
+    out += name + std::string(size - name.size(), '\0');
 }
 
 } // namespace chartdata_test

@@ -14,10 +14,10 @@ class Built : public ::testing::Test {
 protected:
     Built() : vis(grxtest::newChartDocument()->getDocumentElement(), true) {}
     GrxVisualization vis;
+    DOMDocument* doc = vis.getDOMDocument();
 };
 
 TEST_F(Built, IdsSetThroughTheLayerAnswerLookups) {
-    DOMDocument* doc = vis.getDOMDocument();
     GrxStyle& style = vis.addStyle();
     style.setId(u"s1");
     EXPECT_EQ(doc->getElementById(u"s1"), style.getImplementation());
@@ -28,29 +28,30 @@ TEST_F(Built, IdsSetThroughTheLayerAnswerLookups) {
     // A renamed id answers under its new name only; with a duplicate, the one given it last answers.
     style.setId(u"s2");
     EXPECT_EQ(doc->getElementById(u"s1"), nullptr);
-    EXPECT_EQ(vis.getStyleById(u"s2"), &style);
     GrxStyle& twin = vis.addStyle();
     twin.setId(u"s2");
     EXPECT_EQ(vis.getStyleById(u"s2"), &twin);
     vis.removeChild(twin);
     EXPECT_EQ(vis.getStyleById(u"s2"), nullptr);
     style.setId(u"s2"); // declared again
+    EXPECT_EQ(vis.getStyleById(u"s2"), &style);
     // Removing the attribute or the node withdraws the id.
     graph.removeAttribute(GrxUni::_id);
     EXPECT_EQ(doc->getElementById(u"g1"), nullptr);
     vis.removeStyles();
-    EXPECT_FALSE(vis.doesIdExist(u"s2"));
+    EXPECT_FALSE(vis.doesIdExist(u"s2") || vis.doesIdExist(u""));
     EXPECT_EQ(doc->getElementById(u"s2"), nullptr);
-    EXPECT_FALSE(vis.doesIdExist(u""));
 
     // A document made by DOM calls gets its ids declared when it is wrapped.
     DOMDocument* made = grxtest::newChartDocument();
     DOMElement* plain = made->createElementNS(grxtest::kChartNamespace, GrxUni::_style);
     plain->setAttribute(GrxUni::_id, u"plain");
     made->getDocumentElement()->appendChild(plain);
+    made->getDocumentElement()->setAttribute(GrxUni::_id, u"root");
     ASSERT_EQ(made->getElementById(u"plain"), nullptr);
     GrxVisualization wrapped(made->getDocumentElement(), true);
     EXPECT_EQ(made->getElementById(u"plain"), plain);
+    EXPECT_EQ(made->getElementById(u"root"), made->getDocumentElement());
     EXPECT_EQ(wrapped.getStyleById(u"plain"), wrapped.getStyles().at(0));
 }
 
@@ -69,6 +70,7 @@ TEST_F(Built, ReferencesResolveToTheSameWrapper) {
     GrxPoint& point = graph.addPoint();
     point.setCoordinates(coords);
     EXPECT_EQ(point.getCoordinates(), &coords);
+    EXPECT_EQ(attr(coords, GrxUni::_id), "coordinates1");
     GrxColor& color = point.addColor();
     color.setCycle(vis.addStyleCycle(u"styleCycleColor"));
     EXPECT_EQ(color.getCycle(), vis.getStyleCycles().at(0));
@@ -113,28 +115,28 @@ TEST_F(Built, CompoundPropertiesKeepThePartsNotGiven) {
     EXPECT_TRUE(p.empty());
 }
 
-TEST_F(Built, EnumerationsHaveDefinedAbsentValuesAndStableWords) {
+TEST_F(Built, EnumerationsAndTypedValuesReadBackAndUnreadableOnesFallBack) {
     GrrUviza& graph = vis.addGraph();
     GrxDimension& dimension = graph.addCoordinates().addDimension();
     GrxAxis& axis = dimension.addAxis();
     GrxLine& line = graph.addLine();
-    EXPECT_EQ(axis.getTransform(), grx::AxisTransform::none); // a plain axis is not derived
+    // Defined absent values: a plain axis is not derived.
+    EXPECT_EQ(axis.getTransform(), grx::AxisTransform::none);
     EXPECT_EQ(line.getBreakRepresentation(), grx::BreakRepresentation::none);
     EXPECT_EQ(vis.addDerivedVariable().getCategorical(), 0);
     EXPECT_EQ(axis.addMinorTicks().getNumber(), 2);
-    EXPECT_EQ(axis.addMajorTicks().getLabelFrequency(), 1);
     EXPECT_EQ(graph.addPoint().addColor().getAffect(), grx::Affect::none);
     EXPECT_EQ(line.addSmoothStatistic().getKernel(), grx::Kernel::uniform);
+    GrxMajorTicks& ticks = axis.addMajorTicks();
+    EXPECT_EQ(ticks.getLabelFrequency(), 1);
 
     axis.setTransform(grx::AxisTransform::percent);
     line.setBreakRepresentation(grx::BreakRepresentation::wings);
     GrxScale& scale = dimension.addScale(grx::ScaleMethod::log_safe);
     GrxLocation& loc = vis.addLocation(GrxLocation::part_height);
-    const std::pair<std::string, std::string> written[] = {
-        {attr(axis, GrxUni::_transform), "percent"},   {attr(line, u"breakRepresentation"), "wings"},
-        {attr(scale, GrxUni::_method), "log_safe"},    {attr(loc, u"part"), "height"}};
-    for (const auto& [word, expected] : written)
-        EXPECT_EQ(word, expected);
+    EXPECT_EQ(attr(axis, GrxUni::_transform) + " " + attr(line, u"breakRepresentation") + " " +
+                  attr(scale, GrxUni::_method) + " " + attr(loc, u"part"),
+              "percent wings log_safe height");
     EXPECT_EQ(axis.getTransform(), grx::AxisTransform::percent);
     EXPECT_EQ(loc.getPart(), GrxLocation::part_height);
     // A number without a word is written in decimal and reads back; unreadable counts as absent.
@@ -143,10 +145,7 @@ TEST_F(Built, EnumerationsHaveDefinedAbsentValuesAndStableWords) {
     EXPECT_EQ(scale.getMethod(), 42);
     scale.SetAttribute(GrxUni::_method, u"nonsense");
     EXPECT_EQ(scale.getMethod(), grx::ScaleMethod::linear);
-}
 
-TEST_F(Built, TypedValuesReadBackAndUnreadableOnesFallBack) {
-    GrxMajorTicks& ticks = vis.addGraph().addCoordinates().addDimension().addAxis().addMajorTicks();
     ticks.setDelta(0.1 + 0.2);
     EXPECT_EQ(ticks.getDelta(), 0.1 + 0.2); // written so that it reads back exactly
     ticks.setLabelAngle(-90.0);
@@ -156,7 +155,6 @@ TEST_F(Built, TypedValuesReadBackAndUnreadableOnesFallBack) {
     EXPECT_TRUE(ticks.isDeltaPresent());
     ticks.removeDelta();
     EXPECT_FALSE(ticks.isDeltaPresent());
-    EXPECT_EQ(attr(ticks, u"absent"), "");
 
     GrxStyle& style = vis.addStyle();
     EXPECT_TRUE(style.getVisible());
@@ -166,7 +164,6 @@ TEST_F(Built, TypedValuesReadBackAndUnreadableOnesFallBack) {
     EXPECT_FALSE(style.getVisible());
     style.setVisible(true);
     EXPECT_EQ(attr(style, GrxUni::_visible), "true");
-
     CTTextType& text = vis.addLabelFrame().addLabel().addText();
     text.setText(ChartString("R"));
     text.setText(ChartString("R\xC2\xB2")); // replaces, does not append
@@ -219,13 +216,11 @@ TEST_F(Built, RemovalKeepsEarlierPointersUsable) {
     dim.removeAxis(5u); // past the end: nothing
     EXPECT_EQ(dim.getAxiss().size(), 2u);
     dim.removeAxis(0u);
-    ASSERT_EQ(dim.getAxiss().size(), 1u);
-    EXPECT_EQ(dim.getAxiss()[0], &second);
+    EXPECT_EQ(dim.getAxiss(), std::vector<GrxAxis*>{&second});
     EXPECT_EQ(first.getImplementation()->getParentNode(), nullptr);
 }
 
-TEST_F(Built, OnlyChartElementsAreWrapped) {
-    DOMDocument* doc = vis.getDOMDocument();
+TEST_F(Built, OnlyChartElementsOfThisDocumentAreWrapped) {
     DOMElement* foreign = doc->createElementNS(u"urn:other", GrxUni::_style);
     DOMElement* plain = doc->createElement(GrxUni::_legend); // no namespace: taken as the chart's
     DOMElement* unknown = doc->createElementNS(grxtest::kChartNamespace, u"notAChartElement");
@@ -239,7 +234,6 @@ TEST_F(Built, OnlyChartElementsAreWrapped) {
     EXPECT_EQ(vis.getLegends().at(0), legend);
     EXPECT_EQ(vis.wrap(plain), legend); // wrapping again makes nothing new
     EXPECT_TRUE(vis.getStyles().empty());
-    // Nodes of another document are never wrapped into this one.
     GrxVisualization other(grxtest::newChartDocument()->getDocumentElement(), true);
     EXPECT_EQ(vis.wrap(other.addLegend().getImplementation()), nullptr);
 }
@@ -253,8 +247,7 @@ TEST_F(Built, StatisticsOfEveryKindInOrderWithTheirOwnMethodWords) {
     ASSERT_EQ(all, (std::vector<CTStatisticType*>{&bins, &summary}));
     bins.setMethod(grx::BinMethod::allDimensions);
     summary.setMethod(grx::SummaryMethod::range);
-    EXPECT_EQ(attr(bins, GrxUni::_method), "allDimensions");
-    EXPECT_EQ(attr(summary, GrxUni::_method), "7");
+    EXPECT_EQ(attr(bins, GrxUni::_method) + " " + attr(summary, GrxUni::_method), "allDimensions 7");
     // Through the common base the words still read as their numbers.
     EXPECT_EQ(all[0]->getMethod(), grx::BinMethod::allDimensions);
     all[0]->setMethod(grx::BinMethod::notResponse);
@@ -273,7 +266,7 @@ TEST(Document, AReferenceDocumentWrapsLikeAVisualization) {
     // A plain document wrapper over the same DOM, as a frame packer's reference.
     GrxDocument reference(doc->getDocumentElement(), true);
     EXPECT_EQ(reference.getVisualization(), nullptr);
-    DOMElement* legend = reference.getImplementation()->getOwnerDocument()->getElementById(u"legend_1");
+    DOMElement* legend = doc->getElementById(u"legend_1");
     ASSERT_NE(legend, nullptr);
     auto* location = GrxBaseElement::wrapperOf<GrxLocation>(legend->getFirstElementChild());
     ASSERT_NE(location, nullptr);
@@ -293,13 +286,13 @@ TEST_F(Built, HostileNamesAndDepthAreHandled) {
 
     // A chain far deeper than any call stack could follow is wrapped and unwrapped without recursion.
     constexpr int kDepth = 200000;
-    DOMDocument* doc = grxtest::newChartDocument();
-    DOMElement* at = doc->getDocumentElement();
+    DOMDocument* deepDoc = grxtest::newChartDocument();
+    DOMElement* at = deepDoc->getDocumentElement();
     for (int i = 0; i < kDepth; ++i)
         at = static_cast<DOMElement*>(
-            at->appendChild(doc->createElementNS(grxtest::kChartNamespace, GrxUni::_container)));
+            at->appendChild(deepDoc->createElementNS(grxtest::kChartNamespace, GrxUni::_container)));
     at->setAttribute(GrxUni::_id, u"deepest");
-    GrxVisualization deep(doc->getDocumentElement(), true);
+    GrxVisualization deep(deepDoc->getDocumentElement(), true);
     EXPECT_EQ(deep.wrapperCount(), static_cast<std::size_t>(kDepth));
     EXPECT_EQ(deep.getElementById(u"deepest"), at);
     deep.removeChild(*deep.getContainers().at(0));

@@ -4,23 +4,22 @@
 #include "support/GrammarSupport.h"
 
 #include <xercesc/dom/DOMDocument.hpp>
-#include <xercesc/dom/DOMImplementation.hpp>
-#include <xercesc/dom/DOMImplementationRegistry.hpp>
 
 #include <gtest/gtest.h>
 
+#include <regex>
 #include <sstream>
 
 using namespace xercesc;
 
 namespace {
 
-// A chart built only through the layer, touching every add operation.
+// A chart built only through the layer, touching every add operation, every reference and the
+// enumerations whose words the grammar checks.
 void buildEverything(GrxVisualization& vis) {
     GrxStyle& container = vis.addStyle();
     container.setId(u"c-o-n-t-a-i-n-er");
     GrxStyle& style = container.addStyle();
-    style.setColor(GrxStyle::_black);
     style.setFontSize(u"8pt", u"6pt", nullptr);
     style.setFontWeight(2);
     vis.setStyle(style);
@@ -28,7 +27,6 @@ void buildEverything(GrxVisualization& vis) {
     cycle.addCycle().addStyle().setColor(GrxStyle::_white);
     cycle.addExtension();
     GrxExtensionVis& ext = vis.addExtension();
-    ext.setPreserveLocations(false);
     ext.setAttribute(GrxDrillDown::getElementName(), GrxUni::_true);
 
     GrxLabelFrame& title = vis.addLabelFrame();
@@ -36,7 +34,6 @@ void buildEverything(GrxVisualization& vis) {
     GrxLocation& next = title.addLocation(GrxLocation::part_left);
     next.setMethod(GrxLocation::method_nextTo);
     next.setTarget(title);
-    next.setMax(u"25%");
     GrxDescriptionGroup& group = title.addLabel().addDescriptionGroup();
     group.setSeparator(u"\n");
     group.addDescription().setKind(6);
@@ -44,18 +41,14 @@ void buildEverything(GrxVisualization& vis) {
     vis.addControlFrame().addLocation(GrxLocation::part_width);
 
     GrxSourceVariable& x = vis.addSourceVariable();
-    x.setSourceName(u"$CASENUM");
     x.addExtension().setStatistic(1);
     x.addFormat().setBaseFormat(CTFormatType::baseFormat_date);
     GrxExpressionVariable& expr = vis.addExpressionVariable();
-    expr.setValue(u"a/b");
     GrxDerivedVariable& derived = vis.addDerivedVariable();
-    derived.setCreator(u"internal_cutVariable");
     derived.setCategorical(0);
     x.addAggregation(ChartString("Other"), expr, 0.05);
 
     GrxIntervalDomain& interval = vis.addIntervalDomain();
-    interval.setDate(true);
     interval.addRange().setExact(true);
     GrxCategoricalDomain& domain = vis.addCategoricalDomain();
     domain.addVariableReference(x);
@@ -63,7 +56,6 @@ void buildEverything(GrxVisualization& vis) {
     domain.addStatisticSort(false, derived).addSortMove().setCategory(u"a");
     domain.addCategories().setRemove(true);
     x.setCategoricalDomain(domain);
-
     for (auto* source : std::initializer_list<GrxBaseElement*>{
              &vis.addUserSource(), &vis.addDatabaseSource(), &vis.addDelimitedFileSource(),
              &vis.addStreamingSource(), &vis.addEmbeddedSource()})
@@ -72,7 +64,6 @@ void buildEverything(GrxVisualization& vis) {
     GrxContainer& box = vis.addContainer();
     GrxLegend& legend = box.addLegend();
     legend.setTickTextStyle(style);
-    legend.setTickFrameStyle(style);
     box.addKey();
     box.addLocation(GrxLocation::part_bottom);
     ext.setLegend(legend, 1);
@@ -84,33 +75,29 @@ void buildEverything(GrxVisualization& vis) {
     GrxDimension& dim = coords.addDimension();
     dim.setDomain(interval);
     dim.setClusterVariable(x);
-    dim.addScale(2).setOrigin(u"0");
+    dim.addScale(2);
     GrxAxis& axis = dim.addAxis();
     axis.setTransform(0);
-    axis.addAxisTransformParameter().setParameterName(u"base-ratio");
+    axis.addAxisTransformParameter();
     GrxMajorTicks& major = axis.addMajorTicks();
     major.setPosition(1);
     major.setMarkStyle(style);
-    major.setTickFrameStyle(style);
     major.addGridline().addConditionalStyle(ChartString("facet1==facet2"), style);
-    axis.addMinorTicks().setNumber(4);
+    axis.addMinorTicks();
     coords.addDimensionReference().setDimension(dim);
-    coords.addPolarTransform().setCounterClockwise(true);
-    coords.addInsetTransform().setXMin(0.1);
-    coords.addObliqueTransform().setForeShortening(0.5);
+    coords.addPolarTransform();
+    coords.addInsetTransform();
+    coords.addObliqueTransform();
     GrxFacetLayout& facets = graph.addFacetLayout();
     facets.setMethod(2);
     facets.addFacetLevel().addAxis();
     facets.addTableLayout();
     graph.addFaceting().setVariable(x);
-
-    graph.addPointGuide().setX(u"3");
-    graph.addFunctionGuide().setSegments(20);
-    GrxRectangleGuide& rect = graph.addRectangleGuide();
-    rect.setZOrder(-2);
-    rect.setCoordinates(coords);
+    graph.addPointGuide();
+    graph.addFunctionGuide();
+    graph.addRectangleGuide().setCoordinates(coords);
     graph.addPlaneGuide().setNormal(2);
-    graph.addFrameGuide().setComplete(true);
+    graph.addFrameGuide();
 
     GrxPoint& point = graph.addPoint();
     point.setStyle(style);
@@ -121,23 +108,23 @@ void buildEverything(GrxVisualization& vis) {
     by.setCycle(cycle);
     by.setVariable(x);
     by.addSummaryStatistic().setMethod(10);
-    by.addColorMapping().setFrom(u"a");
+    by.addColorMapping();
     by.addDoubleMapping();
-    point.addDash().setClamp(true);
+    point.addDash();
     point.addShape();
-    point.addSize().addLengthMapping().setTo(u"5pt");
+    point.addSize().addLengthMapping();
     point.addRotation();
     point.addColor().setAffect(3);
-    point.addOffset().setHigh(u"3%");
+    point.addOffset();
     point.addPattern();
     point.addColorComponent().setType(2);
     point.addVisibility();
-    point.addImage().setMissing(u"gap");
+    point.addImage();
     GrxLabeling& labeling = point.addLabeling();
     labeling.setTextFrameStyle(style);
     labeling.addSummaryStatistic().setAugment(2);
     point.addConditionalStyle(ChartString("facet1==facet2"), style);
-    point.addSummaryStatistic().setConvertIntervals(false);
+    point.addSummaryStatistic();
     GrxBinStatistic& bins = point.addBinStatistic();
     bins.setGridType(1);
     bins.setMethod(2);
@@ -151,16 +138,11 @@ void buildEverything(GrxVisualization& vis) {
     graph.addArea();
     graph.addInterval().setPositionModifier(1);
     graph.addPolygon();
-    GrxSchema& schema = graph.addSchema();
-    schema.setHingeStyle(style);
-    schema.setMedianStyle(style);
+    graph.addSchema().setHingeStyle(style);
 
     legend.addLegendTarget(*point.getColors()[0]).setVariable(x);
     GrxPopup& popup = vis.addPopup(point);
-    popup.setTokenTemplate(u"Y = $[1]$");
-    GrxTokenMapping& token = popup.addTokenMapping();
-    token.setVariable(x);
-    token.addSummaryStatistic().setMethod(0);
+    popup.addTokenMapping().setVariable(x);
 }
 
 std::string printed(const DOMDocument* doc, bool whiteSpace, const XMLCh* encoding = nullptr) {
@@ -179,6 +161,10 @@ std::unique_ptr<GrxVisualization> reparsed(const std::string& text) {
     return faults.empty() ? engine_test::Chart::parse(text).vis : nullptr;
 }
 
+bool has(const std::string& text, const std::string& part) {
+    return text.find(part) != std::string::npos;
+}
+
 class RoundTrip : public ::testing::Test {
 protected:
     static void SetUpTestSuite() { grammar_test::useSourceGrammars(); }
@@ -190,7 +176,7 @@ TEST_F(RoundTrip, AChartBuiltThroughTheLayerPrintsRevalidatesAndRewraps) {
     EXPECT_EQ(grammar_test::duplicateIds(vis.getDOMDocument()), "");
     const auto again = reparsed(vis.AsUTF8());
     ASSERT_TRUE(again);
-    EXPECT_EQ(grxtest::signature(again->getImplementation()), grxtest::signature(vis.getImplementation()));
+    EXPECT_EQ(again->AsUTF8(), vis.AsUTF8());
     EXPECT_EQ(again->wrapperCount(), vis.wrapperCount());
     // The references still resolve after the trip.
     GrrUviza* graph = again->getContainers().at(0)->getGraphs().at(0);
@@ -200,10 +186,10 @@ TEST_F(RoundTrip, AChartBuiltThroughTheLayerPrintsRevalidatesAndRewraps) {
     EXPECT_EQ(again->getExtension()->getLegend1(), again->getContainers()[0]->getLegends().at(0));
     EXPECT_EQ(graph->getSchemas().at(0)->getHingeStyle(), again->getStyles().at(0)->getStyles().at(0));
 
-    // Pretty printing changes only white space.
-    const auto pretty = reparsed(printed(vis.getDOMDocument(), true));
-    ASSERT_TRUE(pretty);
-    EXPECT_EQ(grxtest::signature(pretty->getImplementation()), grxtest::signature(vis.getImplementation()));
+    // Pretty printing changes only white space between elements.
+    const std::string pretty = printed(vis.getDOMDocument(), true);
+    ASSERT_TRUE(reparsed(pretty));
+    EXPECT_EQ(std::regex_replace(pretty, std::regex(">\\s+(<|$)"), ">$1"), vis.AsUTF8());
 }
 
 TEST_F(RoundTrip, EverySampleChartSurvivesPrintingAndReparsing) {
@@ -216,58 +202,41 @@ TEST_F(RoundTrip, EverySampleChartSurvivesPrintingAndReparsing) {
         EXPECT_FALSE(vis->getGraphs().empty() && vis->getContainers().empty());
         const auto again = reparsed(vis->AsUTF8());
         ASSERT_TRUE(again);
-        EXPECT_EQ(grxtest::signature(again->getImplementation()),
-                  grxtest::signature(vis->getImplementation()));
+        EXPECT_EQ(again->AsUTF8(), vis->AsUTF8());
         EXPECT_EQ(again->wrapperCount(), vis->wrapperCount());
     }
 }
 
 TEST_F(RoundTrip, PrinterWritesUtf8UnlessAskedForAnotherEncoding) {
-    const std::string latin1 =
-        "<?xml version=\"1.0\" encoding=\"ISO-8859-1\"?>\n"
-        "<visualization xmlns=\"http://plotaid.org/grxml\" "
-        "xmlns:xsi=\"http://www.w3.org/2001/XMLSchema-instance\" "
-        "xsi:schemaLocation=\"http://plotaid.org/grxml http://plotaid.org/grxml/grxml-2.9.xsd\">"
-        "<labelFrame><label><text>Gr\xF6\xDF"
-        "e</text></label></labelFrame></visualization>";
-    const auto parsed = reparsed(latin1);
-    ASSERT_TRUE(parsed);
-    GrxVisualization& vis = *parsed;
-    DOMDocument* doc = vis.getDOMDocument();
-    // What the document declares does not matter...
+    const auto vis = reparsed("<?xml version=\"1.0\" encoding=\"ISO-8859-1\"?>\n"
+                              "<visualization xmlns=\"http://plotaid.org/grxml\" "
+                              "xmlns:xsi=\"http://www.w3.org/2001/XMLSchema-instance\" "
+                              "xsi:schemaLocation=\"http://plotaid.org/grxml "
+                              "http://plotaid.org/grxml/grxml-2.9.xsd\">"
+                              "<labelFrame><label><text>Gr\xF6\xDF"
+                              "e</text></label></labelFrame></visualization>");
+    ASSERT_TRUE(vis);
+    DOMDocument* doc = vis->getDOMDocument();
+    // What the document declares does not matter; what is asked for does, and "" means UTF-8.
     const std::string utf8 = printed(doc, false);
-    EXPECT_NE(utf8.find("encoding=\"UTF-8\""), std::string::npos) << utf8;
-    EXPECT_NE(utf8.find("Gr\xC3\xB6\xC3\x9F"
-                        "e"),
-              std::string::npos);
-    EXPECT_EQ(vis.AsUTF8(), utf8);
-    // ... what is asked for does, and an empty request goes back to UTF-8.
-    const std::string latin = printed(doc, false, u"ISO-8859-1");
-    EXPECT_NE(latin.find("encoding=\"ISO-8859-1\""), std::string::npos) << latin;
-    EXPECT_NE(latin.find("Gr\xF6\xDF"
-                         "e"),
-              std::string::npos);
-    const std::string utf16 = printed(doc, false, u"UTF-16LE");
-    ASSERT_GE(utf16.size(), 4u);
-    EXPECT_EQ(utf16[0], '<');
-    EXPECT_EQ(utf16[1], '\0');
+    EXPECT_TRUE(has(utf8, "encoding=\"UTF-8\"") && has(utf8, "Gr\xC3\xB6\xC3\x9F")) << utf8;
+    EXPECT_EQ(vis->AsUTF8(), utf8);
     EXPECT_EQ(printed(doc, false, u""), utf8);
+    const std::string latin = printed(doc, false, u"ISO-8859-1");
+    EXPECT_TRUE(has(latin, "encoding=\"ISO-8859-1\"") && has(latin, "Gr\xF6\xDF")) << latin;
+    EXPECT_EQ(printed(doc, false, u"UTF-16LE").substr(0, 2), std::string("<\0", 2));
     // A character the encoding cannot hold becomes a character reference, not a loss.
-    vis.getLabelFrames()[0]->getLabel()->addText().setText(ChartString("\xE2\x82\xAC"));
-    EXPECT_NE(printed(doc, false, u"ISO-8859-1").find("&#x20AC;"), std::string::npos);
-}
+    vis->getLabelFrames()[0]->getLabel()->addText().setText(ChartString("\xE2\x82\xAC"));
+    EXPECT_TRUE(has(printed(doc, false, u"ISO-8859-1"), "&#x20AC;"));
 
-TEST(ChartPrinter, PrintsANodeAloneAndPrettyPrintsOnRequest) {
-    GrxVisualization vis(grxtest::newChartDocument()->getDocumentElement(), true);
-    GrxLegend& legend = vis.addLegend();
+    // A node prints alone, without a declaration; pretty printing only on request.
+    GrxLegend& legend = vis->addLegend();
     legend.setId(u"legend1");
     legend.addLabel();
     std::ostringstream node;
     ChartPrinter().Print(legend.getImplementation(), node);
-    EXPECT_EQ(node.str().find("<?xml"), std::string::npos);
-    EXPECT_NE(node.str().find("id=\"legend1\""), std::string::npos);
-    EXPECT_EQ(node.str().find('\n'), std::string::npos);
-    EXPECT_NE(printed(vis.getDOMDocument(), true).find("\n  <legend"), std::string::npos);
+    EXPECT_TRUE(!has(node.str(), "<?xml") && has(node.str(), "id=\"legend1\"") && !has(node.str(), "\n"));
+    EXPECT_TRUE(has(printed(doc, true), "\n  <legend"));
     ChartPrinter().Print(static_cast<const DOMNode*>(nullptr), node); // nothing to print, no fault
 }
 

@@ -35,18 +35,18 @@ protected:
 } // namespace
 
 TEST(KovarFormat, WidthRuleKeepsWideTextFormatsOnly) {
-    EXPECT_EQ(Kovar_Format(2, 32767, 0).GetWidth(), 32767);
-    EXPECT_EQ(Kovar_Format(5, 41, 2).GetWidth(), 40);
-    EXPECT_EQ(Kovar_Format(20, 11, 0).GetWidth(), 11);
-    EXPECT_EQ(Kovar_Format(17, 12, 3).GetType(), 17);
-    EXPECT_EQ(Kovar_Format(17, 12, 3).GetDecimals(), 3);
     EXPECT_EQ(sizeof(Kovar_Format), 4u);
-    Kovar_Format text(1, 100, 0);
+    Kovar_Format text(1, 100, 0), number(5, 8, 2);
     text.SetType(5);
-    EXPECT_EQ(text.GetWidth(), 40);
-    Kovar_Format number(5, 8, 2);
     number.SetWidth(200);
-    EXPECT_EQ(number.GetWidth(), 40);
+    const std::pair<Kovar_Format, int> widths[] = {{Kovar_Format(2, 32767, 0), 32767},
+                                                   {Kovar_Format(5, 41, 2), 40},
+                                                   {Kovar_Format(20, 11, 0), 11},
+                                                   {text, 40},
+                                                   {number, 40}};
+    for (const auto& [format, width] : widths)
+        EXPECT_EQ(format.GetWidth(), width) << int(format.GetType());
+    EXPECT_EQ(Kovar_Format(17, 12, 3).GetType() * 10 + Kovar_Format(17, 12, 3).GetDecimals(), 173);
 }
 
 TEST_F(HostSettings, SystemBlockThresholdAndCurrencies) {

@@ -34,6 +34,7 @@ TEST_F(Messages, KeyTabTextLinesUnknownKeysGiveTheKey) {
     EXPECT_EQ(status, 0u);
     EXPECT_EQ(d.LookUp("E2"), "text\twith tab");
     EXPECT_EQ(d.LookUp("spaced key "), " value kept as is ");
+    EXPECT_EQ(d.LookUp(""), ""); // a line without a key defines nothing
     EXPECT_EQ(d.LookUp("# comment", status), "# comment");
     EXPECT_EQ(status, 1u);
 }

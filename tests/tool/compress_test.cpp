@@ -51,13 +51,6 @@ TEST_F(CompressTool, RoundTripsThroughFilesAndPipesWithinTheLimit) {
     const std::string size = std::to_string(original_.size());
     EXPECT_EQ(runTool("decompress " + q("in.z") + " --limit " + size + " -o " + q("ok")).exitCode, 0);
     EXPECT_EQ(readAll(dir_.file("ok")), original_);
-    for (const char* command : {"compress", "decompress"}) {
-        const ToolResult r = runTool(std::string(command) + " --help");
-        EXPECT_EQ(r.exitCode, 0) << command;
-        EXPECT_TRUE(has(r, std::string("usage: plotaid ") + command + " IN [-o OUT]")) << r.output;
-        EXPECT_TRUE(has(runTool("--help"), command));
-    }
-    EXPECT_TRUE(has(runTool("decompress -h"), "--limit BYTES"));
 }
 
 // Bad input fails (1) with a readable line and no output file; a wrong command line fails (2) and

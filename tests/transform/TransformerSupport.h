@@ -2,7 +2,7 @@
 #define PLOTAID_TESTS_TRANSFORMER_SUPPORT_H
 
 #include "support/EngineSupport.h"
-#include "support/TestSupport.h"
+#include "support/GrammarSupport.h"
 
 #include <plotaid/ChartTransformer.h>
 
@@ -13,11 +13,8 @@
 
 namespace transformer_test {
 
+using engine_test::example;
 using TransformerTest = engine_test::EngineTest;
-
-inline std::string example(const std::string& relative) {
-    return readAll(std::string(PLOTAID_EXAMPLES_DIR) + "/" + relative);
-}
 
 inline std::string deflate(const std::string& text) {
     std::string out;
@@ -29,6 +26,21 @@ inline std::string inflate(const std::string& compressed) {
     std::string out;
     EXPECT_TRUE(zpack::decompressString(out, compressed));
     return out;
+}
+
+inline std::size_t count(const std::string& text, const std::string& part) {
+    std::size_t n = 0;
+    for (std::size_t at = text.find(part); at != std::string::npos; at = text.find(part, at + 1))
+        ++n;
+    return n;
+}
+
+// The area chart with its source "rain" renamed to an id that is no XML name.
+inline std::string areaWithSpacedSource() {
+    std::string chart = example("charts/area.xml");
+    for (std::size_t at; (at = chart.find("\"rain\"")) != std::string::npos;)
+        chart.replace(at, 6, "\"my data\"");
+    return chart;
 }
 
 // A parsed document the test owns (data documents too: the wrapper only needs a root).
@@ -43,17 +55,6 @@ struct Parsed : engine_test::Chart {
             if (ChartString(e->getLocalName()) == ChartString(localName))
                 ids.push_back(ChartString(e->getAttribute(u"id")).toUTF8());
         return ids;
-    }
-};
-
-// Whether an error or warning logged while it lives contains the text.
-struct Records {
-    plotaid::detail::RecordCollector collector;
-    bool mentions(const std::string& part) const {
-        for (const auto& r : collector.records())
-            if (r.message.find(part) != std::string::npos)
-                return true;
-        return false;
     }
 };
 

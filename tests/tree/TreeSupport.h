@@ -2,8 +2,8 @@
 #define PLOTAID_TESTS_TREE_TREESUPPORT_H
 
 #include "foundation/ValidatingParser.h"
+#include "support/EngineSupport.h"
 #include "support/GrammarSupport.h"
-#include "support/TestSupport.h"
 
 #include <plotaid/TreeTransformer.h>
 
@@ -38,13 +38,11 @@ inline std::string u8(const XMLCh* text) {
     return text ? ChartString(text).toUTF8() : std::string("<null>");
 }
 
-// Elements of the local name anywhere below (and including) the node, in document order.
+// Elements of the local name anywhere below the node, in document order.
 inline std::vector<XERCES_CPP_NAMESPACE::DOMElement*> elements(const XERCES_CPP_NAMESPACE::DOMNode* node,
                                                                const char* name) {
     std::vector<XERCES_CPP_NAMESPACE::DOMElement*> found;
-    if (node == nullptr)
-        return found;
-    for (auto* child = node->getFirstChild(); child; child = child->getNextSibling()) {
+    for (auto* child = node ? node->getFirstChild() : nullptr; child; child = child->getNextSibling()) {
         if (child->getNodeType() != XERCES_CPP_NAMESPACE::DOMNode::ELEMENT_NODE)
             continue;
         auto* element = static_cast<XERCES_CPP_NAMESPACE::DOMElement*>(child);
@@ -60,9 +58,16 @@ inline std::string attr(const XERCES_CPP_NAMESPACE::DOMElement* element, const c
     if (element == nullptr)
         return "<no element>";
     const std::u16string key(name, name + std::char_traits<char>::length(name));
-    if (!element->hasAttribute(key.c_str()))
-        return "<absent>";
-    return u8(element->getAttribute(key.c_str()));
+    return element->hasAttribute(key.c_str()) ? u8(element->getAttribute(key.c_str())) : "<absent>";
+}
+
+// One attribute of every element of the local name below the node.
+inline std::vector<std::string> values(const XERCES_CPP_NAMESPACE::DOMNode* under, const char* name,
+                                       const char* attribute) {
+    std::vector<std::string> out;
+    for (const auto* e : elements(under, name))
+        out.push_back(attr(e, attribute));
+    return out;
 }
 
 // Texts the library wrote, read back with validation against their grammars.
@@ -87,12 +92,12 @@ inline int xmllint(const std::string& text, const std::string& schema) {
     return r.exitCode;
 }
 
-// The error log's records, counted.
-inline int records(const std::string& log) {
-    int count = 0;
-    for (std::size_t at = log.find(" -- "); at != std::string::npos; at = log.find(" -- ", at + 1))
-        ++count;
-    return count;
+// Whether one of the error messages reported while it lives contains the text.
+inline bool mentions(const engine_test::Records& records, const std::string& part) {
+    for (const std::string& message : records.errors())
+        if (message.find(part) != std::string::npos)
+            return true;
+    return false;
 }
 
 #endif

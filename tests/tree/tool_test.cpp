@@ -6,65 +6,47 @@
 
 namespace {
 
-std::string pmmlPath(const char* name) {
-    return std::string("'") + PLOTAID_EXAMPLES_DIR + "/pmml/" + name + "'";
-}
-
-TEST(TreeTool, PrintsSettingsWithTheOptions) {
-    const ToolResult r = runTool("tree --pmml " + pmmlPath("credit-risk.xml") +
-                                 " --orientation left-to-right --zoom 250 --contents both --font Serif"
-                                 " --colors swatch '#FF010101,#FF020202' --language de-CH");
-    ASSERT_EQ(r.exitCode, 0) << r.output;
-    Reader reader;
-    auto* document = reader.read(r.output);
-    ASSERT_NE(document, nullptr) << r.output;
-    auto* root = document->getDocumentElement();
-    EXPECT_EQ(attr(root, "olang"), "de-CH");
-    EXPECT_EQ(attr(elements(root, "treeOrientation").at(0), "orientation"), "left-to-right");
-    EXPECT_EQ(attr(elements(root, "treeZoom").at(0), "factor"), "250");
-    EXPECT_EQ(attr(elements(root, "nodeContents").at(0), "contents"), "both");
-    EXPECT_EQ(attr(elements(root, "fontData").at(0), "family"), "Serif");
-    const auto colours = elements(elements(root, "swatchColors").at(0), "colorItem");
-    ASSERT_EQ(colours.size(), 2u);
-    EXPECT_EQ(attr(colours[1], "value"), "#FF020202");
-}
-
-TEST(TreeTool, WritesPlainAndCompressedModelAndReadsTheCompressedBack) {
+TEST(TreeTool, OptionsModelsAndRefusals) {
     TempDir dir;
-    const ToolResult r = runTool("tree --pmml " + pmmlPath("churn-surrogates.xml") + " --pmml-out '" +
-                                 dir.file("out.xml") + "' --compressed-pmml-out '" + dir.file("out.z") + "'");
-    ASSERT_EQ(r.exitCode, 0) << r.output;
-    Reader reader;
-    auto* model = reader.read(readAll(dir.file("out.xml")));
-    ASSERT_NE(model, nullptr);
-    EXPECT_EQ(elements(model, "CompoundPredicate").size(), 4u);
-    const ToolResult again =
-        runTool("tree --pmml '" + dir.file("out.z") + "' --pmml-out '" + dir.file("again.xml") + "'");
-    ASSERT_EQ(again.exitCode, 0) << again.output;
-    EXPECT_EQ(readAll(dir.file("again.xml")), readAll(dir.file("out.xml")));
-}
-
-TEST(TreeTool, RefusesBadInput) {
-    TempDir dir;
+    const auto in = [&](const std::string& name) { return " '" + dir.file(name) + "'"; };
     std::ofstream(dir.file("bad.xml"))
         << "<PMML version=\"2.1\" xmlns=\"http://www.dmg.org/PMML-2_1\"><x/></PMML>";
     std::ofstream(dir.file("settings.xml")) << "<displaySettings/>";
-    const std::string credit = "tree --pmml " + pmmlPath("credit-risk.xml");
-    const std::pair<std::string, int> cases[] = {
-        {"tree", 2},
-        {credit + " --zoom 501", 2},
-        {credit + " --orientation sideways", 2},
-        {credit + " --bogus x", 2},
-        {credit + " --pmml-out -", 2},
-        {credit + " --settings '" + dir.file("settings.xml") + "'", 1},
-        {"tree --pmml '" + dir.file("missing.xml") + "'", 1},
+    const std::string pmml = " --pmml '" + std::string(PLOTAID_EXAMPLES_DIR) + "/pmml/",
+                      credit = pmml + "credit-risk.xml'";
+    const struct {
+        std::string args;
+        int exitCode;
+        std::vector<const char*> texts;
+    } rows[] = {
+        {credit + " --orientation left-to-right --zoom 250 --contents both --font Serif --colors swatch "
+                  "'#FF010101,#FF020202' --language de-CH",
+         0,
+         {"olang=\"de-CH\"", "orientation=\"left-to-right\"", "factor=\"250\"", "contents=\"both\"",
+          "family=\"Serif\"", "value=\"#FF020202\""}},
+        {pmml + "churn-surrogates.xml' --pmml-out" + in("out.xml") + " --compressed-pmml-out" + in("out.z"),
+         0,
+         {}},
+        {" --pmml" + in("out.z") + " --pmml-out" + in("again.xml"), 0, {}},
+        {"", 2, {"no PMML file"}},
+        {credit + " --zoom 501", 2, {"zoom '501' is not a whole number from 2 to 500"}},
+        {credit + " --orientation sideways", 2, {"orientation 'sideways' is not"}},
+        {credit + " --bogus x", 2, {"unknown option '--bogus'"}},
+        {credit + " --pmml-out -", 2, {"name a file for the model"}},
+        {credit + " --settings" + in("settings.xml"), 1, {"is not valid display settings"}},
+        {" --pmml" + in("missing.xml"), 1, {"cannot open"}},
+        {" --pmml" + in("bad.xml") + " --pmml-out" + in("o.xml"), 1, {"not a valid PMML 2.1 tree"}},
     };
-    for (const auto& [args, exitCode] : cases)
-        EXPECT_EQ(runTool(args).exitCode, exitCode) << args;
-    const ToolResult model =
-        runTool("tree --pmml '" + dir.file("bad.xml") + "' --pmml-out '" + dir.file("o.xml") + "'");
-    EXPECT_EQ(model.exitCode, 1) << model.output;
-    EXPECT_NE(model.output.find("not a valid PMML 2.1 tree"), std::string::npos) << model.output;
+    for (const auto& row : rows) {
+        const ToolResult r = runTool("tree" + row.args);
+        EXPECT_EQ(r.exitCode, row.exitCode) << row.args << "\n" << r.output;
+        for (const char* text : row.texts)
+            EXPECT_NE(r.output.find(text), std::string::npos) << text << " not in\n" << r.output;
+    }
+    Reader reader;
+    EXPECT_NE(reader.read(runTool("tree" + credit).output), nullptr);
+    EXPECT_EQ(elements(reader.read(readAll(dir.file("out.xml"))), "CompoundPredicate").size(), 4u);
+    EXPECT_EQ(readAll(dir.file("again.xml")), readAll(dir.file("out.xml")));
 }
 
 } // namespace
