@@ -45,10 +45,6 @@ const XMLCh* const BaseTemplate::_zaxis_title = u"zaxis_title";
 
 namespace {
 
-template <class T> void appendAesthetics(std::vector<CTAesthetic*>& out, const std::vector<T*>& in) {
-    out.insert(out.end(), in.begin(), in.end());
-}
-
 // Position of `node` among the "coordinates" elements directly below its parent; -1 when absent.
 long coordinatesPosition(const DOMNode* node) {
     const DOMNode* parent = node ? node->getParentNode() : nullptr;
@@ -151,20 +147,7 @@ std::vector<CTElementType*> BaseTemplate::getElementsWithSummaryStatistics(const
 }
 
 std::vector<CTAesthetic*> BaseTemplate::getAesthetics(const CTElementType& element) const {
-    std::vector<CTAesthetic*> out;
-    appendAesthetics(out, element.getStyleBys());
-    appendAesthetics(out, element.getDashs());
-    appendAesthetics(out, element.getShapes());
-    appendAesthetics(out, element.getSizes());
-    appendAesthetics(out, element.getRotations());
-    appendAesthetics(out, element.getColors());
-    appendAesthetics(out, element.getOffsets());
-    appendAesthetics(out, element.getPatterns());
-    appendAesthetics(out, element.getTransparencys());
-    appendAesthetics(out, element.getSplits());
-    appendAesthetics(out, element.getColorComponents());
-    appendAesthetics(out, element.getVisibilitys());
-    return out;
+    return plotaid::detail::aestheticsOf(element);
 }
 
 std::uint32_t BaseTemplate::getIntervalElements(std::vector<GrxInterval*>& intervals, bool polar) const {

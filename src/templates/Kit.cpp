@@ -32,7 +32,7 @@ void collectGraphs(const DOMElement* parent, std::vector<GrrUviza*>& graphs) {
     }
 }
 
-template <class T> void appendAll(std::vector<CTElementType*>& out, const std::vector<T*>& in) {
+template <class Base, class T> void appendAll(std::vector<Base*>& out, const std::vector<T*>& in) {
     out.insert(out.end(), in.begin(), in.end());
 }
 
@@ -66,6 +66,23 @@ std::vector<CTElementType*> elementsOf(const GrrUviza& graph) {
     appendAll(elements, graph.getPolygons());
     appendAll(elements, graph.getSchemas());
     return elements;
+}
+
+std::vector<CTAesthetic*> aestheticsOf(const CTElementType& element) {
+    std::vector<CTAesthetic*> out;
+    appendAll(out, element.getStyleBys());
+    appendAll(out, element.getDashs());
+    appendAll(out, element.getShapes());
+    appendAll(out, element.getSizes());
+    appendAll(out, element.getRotations());
+    appendAll(out, element.getColors());
+    appendAll(out, element.getOffsets());
+    appendAll(out, element.getPatterns());
+    appendAll(out, element.getTransparencys());
+    appendAll(out, element.getSplits());
+    appendAll(out, element.getColorComponents());
+    appendAll(out, element.getVisibilitys());
+    return out;
 }
 
 std::vector<DOMNode*> nodesNamed(const GrxVisualization& target, const XMLCh* name) {

@@ -43,6 +43,10 @@ template <class Visit> void forEachGraphElements(const GrxVisualization& target,
         visit(elementsOf(*graph));
 }
 
+// Style-bys, dashes, shapes, sizes, rotations, colours, offsets, patterns, transparencies, splits,
+// colour components, visibilities: kind by kind.
+std::vector<CTAesthetic*> aestheticsOf(const CTElementType& element);
+
 // ---- selection --------------------------------------------------------------------------------------
 
 // An aesthetic number picks the n-th aesthetic of a kind (from 1); 0 picks all of them.
