@@ -8,8 +8,6 @@
 #include <xercesc/sax/SAXParseException.hpp>
 #include <xercesc/util/RuntimeException.hpp>
 
-#include <gtest/gtest.h>
-
 #include <algorithm>
 #include <ctime>
 #include <regex>
@@ -32,13 +30,12 @@ protected:
 TEST(ChartException, KeepsItsThreeFieldsThroughCopyAndAssignment) {
     const ChartException raised("bad thing", "src/here", 42);
     ChartException assigned;
-    EXPECT_EQ(std::string(assigned.what()) + std::to_string(assigned.line()), "0");
+    EXPECT_EQ(std::string(assigned.what()) + assigned.file() + std::to_string(assigned.line()), "0");
     assigned = raised;
     const ChartException copy(raised);
     for (const ChartException* e : {&copy, static_cast<const ChartException*>(&assigned)})
         EXPECT_EQ(std::string(e->what()) + e->file() + std::to_string(e->line()), "bad thingsrc/here42");
-    const std::exception& base = copy;
-    EXPECT_STREQ(base.what(), "bad thing");
+    EXPECT_STREQ(static_cast<const std::exception&>(copy).what(), "bad thing");
 }
 
 TEST_F(ErrorHandler, WritesOneRecordWithLocalTimeAndLocationTail) {
@@ -113,23 +110,15 @@ TEST_F(ErrorHandler, EachKindLogsUnderItsNameAndOnlyParserKindsThrow) {
     EXPECT_NO_THROW(handler.fatalError(xml));
 
     const std::string log = dumps.log();
-    const std::string tail = " at file backend/chartxml/plotaid/src/charterrorhandler, line ";
     const std::string text = "bad \xc3\xa9l\xc3\xa9ment at file caf\xc3\xa9, line 3, char 14\n";
-    for (const std::string& expected :
-         {"Warning -- SAX Parser: " + text, "Error -- SAX Parser: " + text,
-          "Fatal Error -- SAX Parser: " + text, "Warning -- SAX: sax trouble" + tail + "188, char 0\n",
-          "Error -- SAX: sax trouble" + tail + "188, char 0\n",
-          "Fatal Error -- SAX: sax trouble" + tail + "188, char 0\n",
-          "Error -- DOM: not found error" + tail + "253", "Error -- DOM: invalid access error" + tail,
-          "Error -- DOM: unknown DOM error" + tail + "253"})
-        EXPECT_NE(log.find(expected), std::string::npos) << expected << "\n" << log;
-    for (const char* prefix : {"Warning -- XML: ", "Error -- XML: ", "Fatal Error -- XML: "}) {
-        const auto at = log.find(prefix);
-        ASSERT_NE(at, std::string::npos) << prefix;
-        const std::string record = log.substr(at, log.find('\n', at) - at);
-        EXPECT_NE(record.find(" at file some/source.cpp, line 77, char 0"), std::string::npos) << record;
-        EXPECT_GT(record.find(" at file"), std::string(prefix).size() + 1) << "message missing: " << record;
+    const std::string xmlText = R"(.+ at file some/source\.cpp, line 77, char 0\n)";
+    for (const std::string kind : {"Warning", "Error", "Fatal Error"}) {
+        EXPECT_NE(log.find(kind + " -- SAX Parser: " + text), std::string::npos) << kind << "\n" << log;
+        EXPECT_NE(log.find(kind + " -- SAX: sax trouble at file "), std::string::npos) << kind;
+        EXPECT_TRUE(std::regex_search(log, std::regex(" [0-9]{4} " + kind + " -- XML: " + xmlText))) << kind;
     }
+    for (const char* dom : {"not found error at", "invalid access error at", "unknown DOM error at"})
+        EXPECT_NE(log.find(std::string("Error -- DOM: ") + dom), std::string::npos) << dom;
 }
 
 // The older wording of a data-type failure: the exception name starts at index 21. The same name one

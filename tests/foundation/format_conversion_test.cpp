@@ -194,29 +194,21 @@ TEST_F(Formats, DatesAndTimes) {
 }
 
 TEST_F(Formats, CustomCurrenciesReadTheirOwnDefinition) {
-    const Convert add = &ChartBase::addFormat;
-    const Row rows[] = {
-        {33,
-         10,
-         2,
-         u"negativesInParentheses|-negativesOutside|-prefix|-suffix|separators=.,/:|useGrouping|"
-         u"maximumFractionDigits#2",
-         nullptr,
-         add,
+    const std::pair<Row, kovar::customCurrency> rows[] = {
+        {{33, 10, 2,
+          u"negativesInParentheses|-negativesOutside|-prefix|-suffix|separators=.,/:|useGrouping|"
+          u"maximumFractionDigits#2"},
          {"", "", "(", ")", "."}},
-        {37,
-         10,
-         1,
-         u"negativesOutside|-negativesInParentheses|prefix=\u20AC |suffix= EUR|separators=,./:",
-         nullptr,
-         add,
+        {{37, 10, 1, u"negativesOutside|-negativesInParentheses|prefix=\u20AC |suffix= EUR|separators=,./:"},
          {"\xE2\x82\xAC ", " EUR", "-", "", ","}},
-        {34, 10, 0, u"negativesInParentheses", nullptr, add, {"", "", "", "-", "."}},
-        {35, 10, 0, u"-negativesInParentheses|-negativesOutside", nullptr, add, {"", "", "", "", "."}},
-        {36, 10, 0, u"prefix=C3", nullptr, add, {"C3", "", "-", "", "."}},
+        {{34, 10, 0, u"negativesInParentheses"}, {"", "", "", "-", "."}},
+        {{35, 10, 0, u"-negativesInParentheses|-negativesOutside"}, {"", "", "", "", "."}},
+        {{36, 10, 0, u"prefix=C3"}, {"C3", "", "-", "", "."}},
     };
-    for (const Row& row : rows)
+    for (auto [row, currency] : rows) {
+        row.currency = currency;
         check(row);
+    }
 }
 
 TEST_F(Formats, OtherTypesAreRefusedButKeepTheCommonSettings) {

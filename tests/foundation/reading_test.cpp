@@ -1,5 +1,5 @@
 #include "foundation/FoundationSupport.h"
-#include "support/EngineSupport.h"
+#include "support/GrammarSupport.h"
 #include "support/ToolRunner.h"
 #include "templates/InstructionWalk.h"
 
@@ -8,25 +8,12 @@
 
 #include <algorithm>
 #include <fstream>
-#include <regex>
 #include <thread>
 
 using namespace foundation_test;
 using engine_test::example;
 
 namespace {
-
-std::string withoutSchemaLine(const std::string& text) {
-    return std::regex_replace(text, std::regex(R"(\s+xsi:schemaLocation="[^"]*")"), "");
-}
-
-std::vector<std::string> sampleCharts() {
-    std::vector<std::string> names;
-    for (const auto& e : std::filesystem::directory_iterator(std::string(PLOTAID_EXAMPLES_DIR) + "/charts"))
-        names.push_back(e.path().filename().string());
-    std::sort(names.begin(), names.end());
-    return names;
-}
 
 std::string restyled(const std::string& chartText) {
     ChartTransformer t(chartText);
@@ -99,10 +86,10 @@ TEST(ToolBatch, RestylesEveryChartIntoTheFolderAndNamesTheFailures) {
 
 // One transformer per thread: four threads over the sample charts give the single-thread output.
 TEST(Threads, FourTransformersAtOnceWriteWhatOneWrites) {
-    const std::vector<std::string> names = sampleCharts();
+    const std::vector<std::string> names = grammar_test::sampleCharts();
     std::vector<std::string> texts, expected;
     for (const std::string& n : names) {
-        texts.push_back(example("charts/" + n));
+        texts.push_back(readAll(n));
         expected.push_back(restyled(texts.back()));
     }
     std::vector<std::vector<std::string>> got(4, std::vector<std::string>(names.size()));
