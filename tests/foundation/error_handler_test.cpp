@@ -27,17 +27,6 @@ protected:
     ChartErrorHandler handler;
 };
 
-TEST(ChartException, KeepsItsThreeFieldsThroughCopyAndAssignment) {
-    const ChartException raised("bad thing", "src/here", 42);
-    ChartException assigned;
-    EXPECT_EQ(std::string(assigned.what()) + assigned.file() + std::to_string(assigned.line()), "0");
-    assigned = raised;
-    const ChartException copy(raised);
-    for (const ChartException* e : {&copy, static_cast<const ChartException*>(&assigned)})
-        EXPECT_EQ(std::string(e->what()) + e->file() + std::to_string(e->line()), "bad thingsrc/here42");
-    EXPECT_STREQ(static_cast<const std::exception&>(copy).what(), "bad thing");
-}
-
 TEST_F(ErrorHandler, WritesOneRecordWithLocalTimeAndLocationTail) {
     DumpFolder dumps;
     const std::time_t now = std::time(nullptr);
@@ -57,8 +46,8 @@ TEST_F(ErrorHandler, WritesOneRecordWithLocalTimeAndLocationTail) {
         << log;
     char expected[32];
     std::strftime(expected, sizeof expected, "%a %b", std::localtime(&now));
-    EXPECT_EQ(log.substr(0, 7), expected);
-    EXPECT_EQ(log.substr(24, 4), std::to_string(1900 + std::localtime(&now)->tm_year));
+    EXPECT_EQ(log.substr(0, 7) + log.substr(24, 4),
+              expected + std::to_string(1900 + std::localtime(&now)->tm_year));
 }
 
 TEST_F(ErrorHandler, NoFolderOrAnUnwritableOneIsSkippedSilently) {
@@ -154,23 +143,17 @@ TEST(Dumps, OptionsCharactersSwitchKindsAndFilesTakeNameCountExtensionAndTheByte
         {"x0y", {0, 2}},
         {"1", {0}},
         {"", {0}},
-        {"01", {1}},
-    };
-    {
-        DumpFolder unset;
-        for (const auto& [options, kinds] : cases) {
-            ScopedEnv set("DumpChartXMLOptions", options);
-            EXPECT_EQ(kindsOn(), kinds) << options;
-        }
-        ScopedEnv noOptions("DumpChartXMLOptions", nullptr);
-        EXPECT_TRUE(kindsOn().empty());
-        EXPECT_FALSE(ChartBase::printString("text", "Template_", ".sgt", 1, 0));
+        {"01", {1}}};
+    for (const auto& [options, kinds] : cases) {
+        DumpFolder folder(options);
+        EXPECT_EQ(kindsOn(), kinds) << options;
     }
     {
-        ScopedEnv noPath("DumpChartXMLPath", nullptr), options("DumpChartXMLOptions", "1111111111");
-        EXPECT_TRUE(kindsOn().empty());
-        EXPECT_FALSE(ChartBase::printString("text", "Template_", ".sgt", 1, 4));
+        DumpFolder noOptions;
+        EXPECT_TRUE(kindsOn().empty() && !ChartBase::printString("text", "Template_", ".sgt", 1, 0));
     }
+    ScopedEnv noPath("DumpChartXMLPath", nullptr), options("DumpChartXMLOptions", "1111111111");
+    EXPECT_TRUE(kindsOn().empty() && !ChartBase::printString("text", "Template_", ".sgt", 1, 4));
     DumpFolder dumps("11111111111111");
     const std::string binary("line\r\nzero\0byte\xff\n", 17);
     EXPECT_TRUE(ChartBase::printString("<before/>", "Xml_before_template_", ".xml", 7,
