@@ -114,7 +114,8 @@ TEST_F(Formats, PlainNumbersGroupOnlyWhenTheHostDoes) {
     }
 }
 
-TEST_F(Formats, NumberTypes) {
+TEST_F(Formats, NumberDateAndTimeTypes) {
+    const Convert date = &ChartBase::FormatDate;
     const Row rows[] = {
         {4, 10, 2, "prefix=$|separators=.,/:|minimumIntegerDigits#2", [] { kovar::setMinIntegerDigits(2); }},
         {5, 8, 3, "scientific#3|+smallNumberThreshold|smallNumberThreshold#0|maximumFractionDigits#3"},
@@ -130,14 +131,8 @@ TEST_F(Formats, NumberTypes) {
         {16, 2, 5, "minimumIntegerDigits#0"},
         {5, 8, 2, "minimumIntegerDigits#40", [] { kovar::setMinIntegerDigits(0xFFFFFFFFu); }},
         // A number width of 60 is read as 40 before conversion.
-        {16, 60, 2, "minimumIntegerDigits#38"}};
-    for (const Row& row : rows)
-        check(row);
-}
-
-TEST_F(Formats, DatesAndTimes) {
-    const Convert date = &ChartBase::FormatDate;
-    const Row rows[] = {
+        {16, 60, 2, "minimumIntegerDigits#38"},
+        // Dates and times.
         {21, 5, 0,
          "baseFormat#4|showHour|showMinute|!showSecond|!showMilliseconds|hourPadding|minutePadding|"
          "-secondPadding|hourFormat#2"},
