@@ -1,10 +1,11 @@
 #ifndef PLOTAID_TESTS_FOUNDATION_SUPPORT_H
 #define PLOTAID_TESTS_FOUNDATION_SUPPORT_H
 
-#include "support/TestSupport.h"
+#include "support/EngineSupport.h"
 
 #include <filesystem>
 #include <optional>
+#include <regex>
 #include <string>
 
 namespace foundation_test {
@@ -42,6 +43,14 @@ inline std::string testData(const std::string& name) {
 struct TestResources {
     ScopedEnv env{"PLOTAID_RESOURCE_DIR", testData("resources")};
 };
+
+inline std::string utf8(const XMLCh* text) {
+    return ChartString(text).toUTF8();
+}
+
+inline std::string withoutSchemaLine(const std::string& text) {
+    return std::regex_replace(text, std::regex(R"(\s+xsi:schemaLocation="[^"]*")"), "");
+}
 
 } // namespace foundation_test
 

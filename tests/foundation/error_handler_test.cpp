@@ -8,8 +8,6 @@
 #include <xercesc/sax/SAXParseException.hpp>
 #include <xercesc/util/RuntimeException.hpp>
 
-#include <gtest/gtest.h>
-
 #include <algorithm>
 #include <ctime>
 #include <regex>
@@ -28,18 +26,6 @@ protected:
     plotaid::detail::XercesRuntime runtime;
     ChartErrorHandler handler;
 };
-
-TEST(ChartException, KeepsItsThreeFieldsThroughCopyAndAssignment) {
-    const ChartException raised("bad thing", "src/here", 42);
-    ChartException assigned;
-    EXPECT_EQ(std::string(assigned.what()) + std::to_string(assigned.line()), "0");
-    assigned = raised;
-    const ChartException copy(raised);
-    for (const ChartException* e : {&copy, static_cast<const ChartException*>(&assigned)})
-        EXPECT_EQ(std::string(e->what()) + e->file() + std::to_string(e->line()), "bad thingsrc/here42");
-    const std::exception& base = copy;
-    EXPECT_STREQ(base.what(), "bad thing");
-}
 
 TEST_F(ErrorHandler, WritesOneRecordWithLocalTimeAndLocationTail) {
     DumpFolder dumps;
@@ -60,8 +46,8 @@ TEST_F(ErrorHandler, WritesOneRecordWithLocalTimeAndLocationTail) {
         << log;
     char expected[32];
     std::strftime(expected, sizeof expected, "%a %b", std::localtime(&now));
-    EXPECT_EQ(log.substr(0, 7), expected);
-    EXPECT_EQ(log.substr(24, 4), std::to_string(1900 + std::localtime(&now)->tm_year));
+    EXPECT_EQ(log.substr(0, 7) + log.substr(24, 4),
+              expected + std::to_string(1900 + std::localtime(&now)->tm_year));
 }
 
 TEST_F(ErrorHandler, NoFolderOrAnUnwritableOneIsSkippedSilently) {
@@ -113,23 +99,17 @@ TEST_F(ErrorHandler, EachKindLogsUnderItsNameAndOnlyParserKindsThrow) {
     EXPECT_NO_THROW(handler.fatalError(xml));
 
     const std::string log = dumps.log();
-    const std::string tail = " at file backend/chartxml/plotaid/src/charterrorhandler, line ";
     const std::string text = "bad \xc3\xa9l\xc3\xa9ment at file caf\xc3\xa9, line 3, char 14\n";
-    for (const std::string& expected :
-         {"Warning -- SAX Parser: " + text, "Error -- SAX Parser: " + text,
-          "Fatal Error -- SAX Parser: " + text, "Warning -- SAX: sax trouble" + tail + "188, char 0\n",
-          "Error -- SAX: sax trouble" + tail + "188, char 0\n",
-          "Fatal Error -- SAX: sax trouble" + tail + "188, char 0\n",
-          "Error -- DOM: not found error" + tail + "253", "Error -- DOM: invalid access error" + tail,
-          "Error -- DOM: unknown DOM error" + tail + "253"})
-        EXPECT_NE(log.find(expected), std::string::npos) << expected << "\n" << log;
-    for (const char* prefix : {"Warning -- XML: ", "Error -- XML: ", "Fatal Error -- XML: "}) {
-        const auto at = log.find(prefix);
-        ASSERT_NE(at, std::string::npos) << prefix;
-        const std::string record = log.substr(at, log.find('\n', at) - at);
-        EXPECT_NE(record.find(" at file some/source.cpp, line 77, char 0"), std::string::npos) << record;
-        EXPECT_GT(record.find(" at file"), std::string(prefix).size() + 1) << "message missing: " << record;
+    const std::string tail = " at file backend/chartxml/plotaid/src/charterrorhandler, line ";
+    const std::string xmlText = R"(.+ at file some/source\.cpp, line 77, char 0\n)";
+    for (const std::string kind : {"Warning", "Error", "Fatal Error"}) {
+        EXPECT_NE(log.find(kind + " -- SAX Parser: " + text), std::string::npos) << kind << "\n" << log;
+        EXPECT_NE(log.find(kind + " -- SAX: sax trouble" + tail + "188, char 0\n"), std::string::npos)
+            << kind;
+        EXPECT_TRUE(std::regex_search(log, std::regex(" [0-9]{4} " + kind + " -- XML: " + xmlText))) << kind;
     }
+    for (const char* dom : {"not found error", "invalid access error", "unknown DOM error"})
+        EXPECT_NE(log.find("Error -- DOM: " + (dom + tail) + "253, char 0\n"), std::string::npos) << dom;
 }
 
 // The older wording of a data-type failure: the exception name starts at index 21. The same name one
@@ -165,23 +145,17 @@ TEST(Dumps, OptionsCharactersSwitchKindsAndFilesTakeNameCountExtensionAndTheByte
         {"x0y", {0, 2}},
         {"1", {0}},
         {"", {0}},
-        {"01", {1}},
-    };
-    {
-        DumpFolder unset;
-        for (const auto& [options, kinds] : cases) {
-            ScopedEnv set("DumpChartXMLOptions", options);
-            EXPECT_EQ(kindsOn(), kinds) << options;
-        }
-        ScopedEnv noOptions("DumpChartXMLOptions", nullptr);
-        EXPECT_TRUE(kindsOn().empty());
-        EXPECT_FALSE(ChartBase::printString("text", "Template_", ".sgt", 1, 0));
+        {"01", {1}}};
+    for (const auto& [options, kinds] : cases) {
+        DumpFolder folder(options);
+        EXPECT_EQ(kindsOn(), kinds) << options;
     }
     {
-        ScopedEnv noPath("DumpChartXMLPath", nullptr), options("DumpChartXMLOptions", "1111111111");
-        EXPECT_TRUE(kindsOn().empty());
-        EXPECT_FALSE(ChartBase::printString("text", "Template_", ".sgt", 1, 4));
+        DumpFolder noOptions;
+        EXPECT_TRUE(kindsOn().empty() && !ChartBase::printString("text", "Template_", ".sgt", 1, 0));
     }
+    ScopedEnv noPath("DumpChartXMLPath", nullptr), options("DumpChartXMLOptions", "1111111111");
+    EXPECT_TRUE(kindsOn().empty() && !ChartBase::printString("text", "Template_", ".sgt", 1, 4));
     DumpFolder dumps("11111111111111");
     const std::string binary("line\r\nzero\0byte\xff\n", 17);
     EXPECT_TRUE(ChartBase::printString("<before/>", "Xml_before_template_", ".xml", 7,

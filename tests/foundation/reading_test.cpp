@@ -1,5 +1,5 @@
 #include "foundation/FoundationSupport.h"
-#include "support/EngineSupport.h"
+#include "support/GrammarSupport.h"
 #include "support/ToolRunner.h"
 #include "templates/InstructionWalk.h"
 
@@ -8,7 +8,6 @@
 
 #include <algorithm>
 #include <fstream>
-#include <regex>
 #include <thread>
 
 using namespace foundation_test;
@@ -16,17 +15,7 @@ using engine_test::example;
 
 namespace {
 
-std::string withoutSchemaLine(const std::string& text) {
-    return std::regex_replace(text, std::regex(R"(\s+xsi:schemaLocation="[^"]*")"), "");
-}
-
-std::vector<std::string> sampleCharts() {
-    std::vector<std::string> names;
-    for (const auto& e : std::filesystem::directory_iterator(std::string(PLOTAID_EXAMPLES_DIR) + "/charts"))
-        names.push_back(e.path().filename().string());
-    std::sort(names.begin(), names.end());
-    return names;
-}
+const std::string kCharts = std::string(PLOTAID_EXAMPLES_DIR) + "/charts/";
 
 std::string restyled(const std::string& chartText) {
     ChartTransformer t(chartText);
@@ -44,14 +33,12 @@ TEST_F(TemplatesAsWritten, NeedNoSchemaLineAndTextThatIsNotXmlFailsWithTheParser
         std::string text;
         bool read;
         std::size_t instructions;
-    } rows[] = {
-        {bare, true, 5},
-        {std::regex_replace(bare, std::regex(R"(\s+xmlns:xsi="[^"]*")"), ""), true, 5},
-        {open + "<madeUp/></template>", true, 0}, // no instruction: the earlier form, converted
-        {"<template xmlns=\"http://plotaid.org/other\"><setStyle type=\"bar\"/></template>", true, 0},
-        {open + "<setStyle>", false, 0},
-        {"this is not XML", false, 0},
-    };
+    } rows[] = {{bare, true, 5},
+                {std::regex_replace(bare, std::regex(R"(\s+xmlns:xsi="[^"]*")"), ""), true, 5},
+                {open + "<madeUp/></template>", true, 0}, // no instruction: the earlier form, converted
+                {"<template xmlns=\"http://plotaid.org/other\"><setStyle type=\"bar\"/></template>", true, 0},
+                {open + "<setStyle>", false, 0},
+                {"this is not XML", false, 0}};
     for (const auto& row : rows) {
         SCOPED_TRACE(row.text.substr(0, 200));
         engine_test::Chart chart = engine_test::Chart::parse(example("charts/simple-bar.xml"));
@@ -70,9 +57,8 @@ TEST_F(TemplatesAsWritten, NeedNoSchemaLineAndTextThatIsNotXmlFailsWithTheParser
     std::ofstream(dir.file("notxml.txt")) << "<template>\n  this is <not XML";
     ChartTransformer pie(example("charts/pie.xml"));
     EXPECT_FALSE(pie.applyTemplate(readAll(dir.file("notxml.txt"))));
-    const std::string charts = std::string(PLOTAID_EXAMPLES_DIR) + "/charts/";
     const ToolResult single =
-        runTool("apply --chart " + charts + "pie.xml --template " + dir.file("notxml.txt"));
+        runTool("apply --chart " + kCharts + "pie.xml --template " + dir.file("notxml.txt"));
     EXPECT_EQ(single.exitCode, 1);
     EXPECT_NE(single.output.find("notxml.txt:2:19: equal sign expected"), std::string::npos) << single.output;
 }
@@ -80,29 +66,29 @@ TEST_F(TemplatesAsWritten, NeedNoSchemaLineAndTextThatIsNotXmlFailsWithTheParser
 // The batch form writes each chart as the single form does, and one line per chart that failed.
 TEST(ToolBatch, RestylesEveryChartIntoTheFolderAndNamesTheFailures) {
     TempDir dir;
-    const std::string charts = std::string(PLOTAID_EXAMPLES_DIR) + "/charts/";
     const std::string tmpl =
         " --template " + std::string(PLOTAID_EXAMPLES_DIR) + "/templates/presentation.sgt";
     std::ofstream(dir.file("broken.xml")) << "<visualization";
-    const ToolResult batch = runTool("apply" + tmpl + " -o " + dir.file("out") + " -j 2 " + charts +
-                                     "pie.xml " + dir.file("broken.xml") + " " + charts + "simple-bar.xml");
+    const ToolResult batch = runTool("apply" + tmpl + " -o " + dir.file("out") + " -j 2 " + kCharts +
+                                     "pie.xml " + dir.file("broken.xml") + " " + kCharts + "simple-bar.xml");
     EXPECT_EQ(batch.exitCode, 1) << batch.output;
     EXPECT_EQ(std::count(batch.output.begin(), batch.output.end(), '\n'), 1) << batch.output;
     EXPECT_NE(batch.output.find("broken.xml"), std::string::npos) << batch.output;
     for (const char* name : {"pie.xml", "simple-bar.xml"}) {
-        EXPECT_EQ(runTool("apply --chart " + charts + name + tmpl + " -o " + dir.file(name)).exitCode, 0);
+        EXPECT_EQ(runTool("apply --chart " + kCharts + name + tmpl + " -o " + dir.file(name)).exitCode, 0);
         EXPECT_EQ(readAll(dir.file("out/" + std::string(name))), readAll(dir.file(name))) << name;
     }
     EXPECT_FALSE(std::filesystem::exists(dir.file("out/broken.xml")));
-    EXPECT_EQ(runTool("apply" + tmpl + " -o " + dir.file("out") + " -j 2 " + charts + "pie.xml").exitCode, 0);
+    EXPECT_EQ(runTool("apply" + tmpl + " -o " + dir.file("out") + " -j 2 " + kCharts + "pie.xml").exitCode,
+              0);
 }
 
 // One transformer per thread: four threads over the sample charts give the single-thread output.
 TEST(Threads, FourTransformersAtOnceWriteWhatOneWrites) {
-    const std::vector<std::string> names = sampleCharts();
+    const std::vector<std::string> names = grammar_test::sampleCharts();
     std::vector<std::string> texts, expected;
     for (const std::string& n : names) {
-        texts.push_back(example("charts/" + n));
+        texts.push_back(readAll(n));
         expected.push_back(restyled(texts.back()));
     }
     std::vector<std::vector<std::string>> got(4, std::vector<std::string>(names.size()));

@@ -8,8 +8,6 @@
 #include <xercesc/dom/DOM.hpp>
 #include <xercesc/sax/InputSource.hpp>
 
-#include <gtest/gtest.h>
-
 #include <regex>
 #include <thread>
 
@@ -29,14 +27,6 @@ std::string chart(const std::string& body, const std::string& doctype = "") {
            body + "</chart>";
 }
 
-std::string utf8(const XMLCh* text) {
-    return ChartString(text).toUTF8();
-}
-
-std::string withoutSchemaLine(const std::string& text) {
-    return std::regex_replace(text, std::regex(R"(\s+xsi:schemaLocation="[^"]*")"), "");
-}
-
 const ChartException kFailure("parseDocument fatal error while parsing",
                               "backend/chartxml/plotaid/src/chartbase", 1105);
 
@@ -53,6 +43,7 @@ protected:
             all += e + "\n";
         return all;
     }
+    std::string text(const DOMDocument* doc) { return utf8(doc->getDocumentElement()->getTextContent()); }
 };
 
 // Above the maximum, below the minimum, no integer, a decimal for an integer, malformed double and
@@ -62,14 +53,13 @@ TEST_F(Parsing, ValidDocumentsAndWrongDataTypeValuesParseWithoutAnyRecord) {
     ASSERT_NE(doc, nullptr);
     EXPECT_TRUE(parser.lastErrors().empty());
     ASSERT_NE(doc->getElementById(u"a"), nullptr) << "the schema makes it an ID";
-    EXPECT_EQ(utf8(doc->getElementById(u"a")->getAttribute(u"count")), "3");
     for (const std::string value : {"percent=\"101\"", "percent=\"-1\"", "count=\"x\"", "count=\"1.5\"",
                                     "weight=\"1.2.3\"", "share=\"1..2\"", "visible=\"yes\"",
                                     "shape=\"triangle\"", "day=\"2026-13-01\"", "id=\"a\"/><item id=\"a\""}) {
         doc = parse(chart("<item " + value + "/><size>seven</size>"));
         ASSERT_NE(doc, nullptr) << value;
-        const DOMElement* item = doc->getDocumentElement()->getFirstElementChild();
         const std::string name = value.substr(0, value.find('='));
+        const DOMElement* item = doc->getDocumentElement()->getFirstElementChild();
         EXPECT_EQ(name + "=\"" + utf8(item->getAttribute(ChartString(name).xc_str())) + "\"",
                   value.substr(0, value.find('"', name.size() + 2) + 1));
     }
@@ -77,34 +67,31 @@ TEST_F(Parsing, ValidDocumentsAndWrongDataTypeValuesParseWithoutAnyRecord) {
     EXPECT_FALSE(std::filesystem::exists(dumps.dir().file("parseError_00.xml")));
 }
 
-TEST_F(Parsing, UndeclaredElementStopsTheParseWithRecordAndDump) {
+// Declaring UTF-16 over UTF-8 bytes makes the parser warn and carry on; we stop. Every failure is
+// logged, and the text dumped when kind nine is on.
+TEST_F(Parsing, UndeclaredElementsWarningsMalformedTextAndAMissingSchemaFailWithRecords) {
     const std::string text = chart("<item/><bogus/>");
+    const std::pair<std::string, const char*> rows[] = {
+        {text, "Error -- SAX Parser: no declaration found for element 'bogus' at file ChartBase"},
+        {text, "Error -- ChartXML: parseDocument fatal error while parsing at file "},
+        {"<?xml version=\"1.0\" encoding=\"UTF-16\"?>" + chart("").substr(21), "Warning -- SAX Parser: "},
+        {"<chart", "Fatal Error -- SAX Parser:"},
+        {"", "Fatal Error -- SAX Parser:"},
+        {std::string("\0\0\0", 3), "Fatal Error -- SAX Parser:"}};
+    for (const auto& [bad, record] : rows) {
+        std::filesystem::remove(dumps.dir().file("parseError_00.xml"));
+        EXPECT_EQ(parse(bad), nullptr);
+        EXPECT_FALSE(parser.lastErrors().empty());
+        EXPECT_NE(dumps.log().find(record), std::string::npos) << record << "\n" << dumps.log();
+        EXPECT_EQ(readAll(dumps.dir().file("parseError_00.xml")), bad);
+    }
     EXPECT_EQ(parse(text), nullptr);
-    for (const char* record :
-         {"Error -- SAX Parser: no declaration found for element 'bogus' at file ChartBase, line 1, char",
-          "Error -- ChartXML: parseDocument fatal error while parsing at file "
-          "backend/chartxml/plotaid/src/chartbase, "
-          "line 1105, char 0\n"})
-        EXPECT_NE(dumps.log().find(record), std::string::npos) << dumps.log();
-    EXPECT_EQ(readAll(dumps.dir().file("parseError_00.xml")), text);
     ASSERT_EQ(parser.lastErrors().size(), 1u);
-    EXPECT_TRUE(std::regex_match(parser.lastErrors()[0], std::regex("ChartBase:1:[0-9]+: .*'bogus'.*")))
-        << parser.lastErrors()[0];
+    EXPECT_TRUE(std::regex_match(parser.lastErrors()[0], std::regex("ChartBase:1:[0-9]+: .*'bogus'.*")));
     std::filesystem::remove(dumps.dir().file("parseError_00.xml"));
-    ScopedEnv options("DumpChartXMLOptions", "1111111110"); // no dump when kind nine is off
+    ScopedEnv options("DumpChartXMLOptions", "1111111110"); // kind nine off
     EXPECT_EQ(parse(text), nullptr);
     EXPECT_FALSE(std::filesystem::exists(dumps.dir().file("parseError_00.xml")));
-}
-
-// Declaring UTF-16 over UTF-8 bytes makes the parser warn and carry on; we stop.
-TEST_F(Parsing, WarningsMalformedTextAndAMissingSchemaFail) {
-    EXPECT_EQ(parse("<?xml version=\"1.0\" encoding=\"UTF-16\"?>" + chart("").substr(21)), nullptr);
-    EXPECT_NE(dumps.log().find("Warning -- SAX Parser: "), std::string::npos) << dumps.log();
-    for (const std::string& text : {std::string("<chart"), std::string(), std::string("\0\0\0", 3)}) {
-        EXPECT_EQ(parse(text), nullptr);
-        EXPECT_FALSE(parser.lastErrors().empty());
-    }
-    EXPECT_NE(dumps.log().find("Fatal Error -- SAX Parser:"), std::string::npos);
     TempDir empty;
     ScopedEnv folder("PLOTAID_RESOURCE_DIR", empty.path());
     EXPECT_EQ(parse(chart("<item/>")), nullptr);
@@ -126,25 +113,20 @@ TEST_F(Parsing, ParserIsReusableAndAnAdoptedDocumentOutlivesLaterParses) {
     EXPECT_EQ(utf8(mine->getDocumentElement()->getTextContent()), "kept");
 }
 
-std::string nestedGroups(std::size_t depth) {
-    std::string open, close;
-    for (std::size_t i = 0; i < depth; ++i)
-        open += "<group>", close += "</group>";
-    return chart(open + close);
-}
+// The chart element itself is one level. A hostile depth is refused as soon as the limit is passed;
+// entities are bounded in count and length, predefined and character references are not counted.
+TEST_F(Parsing, NestingAndEntityExpansionAreBounded) {
+    const auto nested = [](std::size_t depth) {
+        std::string open, close;
+        for (std::size_t i = 0; i < depth; ++i)
+            open += "<group>", close += "</group>";
+        return chart(open + close);
+    };
+    EXPECT_NE(parse(nested(ValidatingParser::kNestingLimit - 1)), nullptr);
+    EXPECT_EQ(parse(nested(ValidatingParser::kNestingLimit)), nullptr);
+    EXPECT_NE(errors().find("nested more than 1024 deep"), std::string::npos);
+    EXPECT_EQ(parse(nested(200000)), nullptr);
 
-// The chart element itself is one level. A hostile depth is refused as soon as the limit is passed.
-TEST_F(Parsing, NestingIsBoundedWhileDeepTreesStillParse) {
-    EXPECT_NE(parse(nestedGroups(ValidatingParser::kNestingLimit - 1)), nullptr);
-    EXPECT_EQ(parse(nestedGroups(ValidatingParser::kNestingLimit)), nullptr);
-    ASSERT_FALSE(parser.lastErrors().empty());
-    EXPECT_NE(parser.lastErrors().front().find("nested more than 1024 deep"), std::string::npos);
-    EXPECT_EQ(parse(nestedGroups(200000)), nullptr);
-    EXPECT_NE(dumps.log().find("Fatal Error -- SAX Parser: elements are nested more than"),
-              std::string::npos);
-}
-
-TEST_F(Parsing, EntityExpansionIsBoundedInCountAndLength) {
     std::string laughs = "<!DOCTYPE chart [<!ENTITY l0 \"ha\">";
     for (int level = 1; level <= 10; ++level) {
         laughs += "<!ENTITY l" + std::to_string(level) + " \"";
@@ -153,28 +135,22 @@ TEST_F(Parsing, EntityExpansionIsBoundedInCountAndLength) {
         laughs += "\">";
     }
     EXPECT_EQ(parse(chart("<label>&l10;</label>", laughs + "]>")), nullptr);
-    EXPECT_NE(dumps.log().find(
-                  "Fatal Error -- SAX Parser: parser has encountered more than '5000' entity expansions"),
-              std::string::npos);
-    const std::string refs = "&big;&big;&big;&big;&big;&big;&big;&big;";
+    EXPECT_NE(dumps.log().find("more than '5000' entity expansions"), std::string::npos);
     const auto withBig = [&](std::size_t length) {
-        return chart("<label>" + refs + "</label>",
+        return chart("<label>&big;&big;&big;&big;&big;&big;&big;&big;</label>",
                      "<!DOCTYPE chart [<!ENTITY big \"" + std::string(length, 'y') + "\">]>");
     };
     EXPECT_EQ(parse(withBig(ValidatingParser::kEntityValueLimit + 1)), nullptr);
     EXPECT_NE(dumps.log().find("limit imposed by the application"), std::string::npos);
     const DOMDocument* doc = parse(withBig(ValidatingParser::kEntityValueLimit));
     ASSERT_NE(doc, nullptr) << errors();
-    EXPECT_EQ(utf8(doc->getDocumentElement()->getTextContent()).size(),
-              8 * ValidatingParser::kEntityValueLimit);
-    // Predefined and character references are not counted as expansions.
-    std::string text;
+    EXPECT_EQ(text(doc).size(), 8 * ValidatingParser::kEntityValueLimit);
+    std::string refs;
     for (std::size_t i = 0; i < 2 * ValidatingParser::kEntityExpansionLimit; ++i)
-        text += "&amp;&#65;";
-    doc = parse(chart("<label>" + text + "</label>"));
+        refs += "&amp;&#65;";
+    doc = parse(chart("<label>" + refs + "</label>"));
     ASSERT_NE(doc, nullptr);
-    EXPECT_EQ(utf8(doc->getDocumentElement()->getTextContent()).size(),
-              4 * ValidatingParser::kEntityExpansionLimit);
+    EXPECT_EQ(text(doc).size(), 4 * ValidatingParser::kEntityExpansionLimit);
 }
 
 // Documents that try to pull a file from outside the resource folder into the parse; a bare file name
@@ -197,7 +173,6 @@ TEST_F(Parsing, EntitiesAndDoctypesOutsideTheResourceFolderAreRefused) {
         EXPECT_NE(errors().find("refused to read"), std::string::npos) << errors();
         EXPECT_EQ(errors().find("MARKER-OUTSIDE-THE-RESOURCE-FOLDER"), std::string::npos) << errors();
     }
-    EXPECT_NE(dumps.log().find("resolveEntity refused"), std::string::npos);
     EXPECT_EQ(dumps.log().find("MARKER-OUTSIDE-THE-RESOURCE-FOLDER"), std::string::npos);
 }
 
@@ -209,31 +184,28 @@ TEST_F(Parsing, TheResolverServesOnlyFilesOfTheSchemaFolder) {
         std::unique_ptr<InputSource> source(handler.resolveEntity(nullptr, id.c_str()));
         return source ? utf8(source->getSystemId()) : std::string();
     };
-    const std::string file =
-        std::filesystem::canonical(testData("resources/schemas/foundation-test.xsd")).string();
-    for (const std::u16string id :
+    const std::string file = std::filesystem::canonical(testData("resources/schemas/foundation-test.xsd"));
+    for (const char16_t* id :
          {u"http://plotaid.org/test/foundation-test.xsd",
           u"http://elsewhere.example/a/b/c/foundation-test.xsd", u"x/foundation-test.xsd"})
         EXPECT_EQ(resolves(id), file);
-    const std::u16string refused[] = {u"foundation-test.xsd",
-                                      u"/foundation-test.xsd",
-                                      u"http://plotaid.org/test/",
-                                      u"http://plotaid.org/test/..",
-                                      u"http://plotaid.org/test/.",
-                                      u"http://plotaid.org/a\\..\\marker.txt",
-                                      u"http://plotaid.org/%2e%2e%2fmarker.txt",
-                                      u"http://plotaid.org/test/missing.xsd",
-                                      u"file:///etc/passwd",
-                                      u""};
-    for (const std::u16string& id : refused)
-        EXPECT_EQ(resolves(id), "") << utf8(id.c_str());
+    const char16_t* refused[] = {u"foundation-test.xsd",
+                                 u"/foundation-test.xsd",
+                                 u"http://plotaid.org/test/",
+                                 u"http://plotaid.org/test/..",
+                                 u"http://plotaid.org/test/.",
+                                 u"http://plotaid.org/a\\..\\marker.txt",
+                                 u"http://plotaid.org/%2e%2e%2fmarker.txt",
+                                 u"http://plotaid.org/test/missing.xsd",
+                                 u"file:///etc/passwd",
+                                 u""};
+    for (const char16_t* id : refused)
+        EXPECT_EQ(resolves(id), "") << utf8(id);
     EXPECT_EQ(handler.resolveEntity(nullptr, nullptr), nullptr);
     const std::string log = dumps.log();
-    std::size_t records = 0;
-    for (std::size_t at = 0;
-         (at = log.find("Error -- ChartXML: resolveEntity refused", at)) != std::string::npos; ++at)
-        ++records;
-    EXPECT_EQ(records, std::size(refused) + 1);
+    const std::regex refusal("Error -- ChartXML: resolveEntity refused");
+    EXPECT_EQ(std::size_t(std::distance(std::sregex_iterator(log.begin(), log.end(), refusal), {})),
+              std::size(refused) + 1);
     EXPECT_NE(log.find("refused 'file:///etc/passwd'"), std::string::npos) << log;
 
     // Links are followed, and must stay inside the folder; the folder above is not served.
@@ -267,19 +239,17 @@ TEST_F(Parsing, TheCallerChoosesTheGrammarAndNoDocumentLeavesADeclarationBehind)
         const std::string& text;
         DocumentKind kind;
         bool valid;
-    } rows[] = {
-        {bar, DocumentKind::Chart, true},
-        {bar, DocumentKind::Data, true},
-        {bar, DocumentKind::Named, false},
-        {claim, DocumentKind::Chart, true},
-        {bar, DocumentKind::Template, false},
-        {data, DocumentKind::Data, true},
-        {data, DocumentKind::Chart, false},
-        {declared, DocumentKind::Chart, true},
-        {used, DocumentKind::Chart, false},
-        {pmml, DocumentKind::Pmml, true},
-        {withoutSchemaLine(pmml), DocumentKind::TreeDisplay, false},
-    };
+    } rows[] = {{bar, DocumentKind::Chart, true},
+                {bar, DocumentKind::Data, true},
+                {bar, DocumentKind::Named, false},
+                {claim, DocumentKind::Chart, true},
+                {bar, DocumentKind::Template, false},
+                {data, DocumentKind::Data, true},
+                {data, DocumentKind::Chart, false},
+                {declared, DocumentKind::Chart, true},
+                {used, DocumentKind::Chart, false},
+                {pmml, DocumentKind::Pmml, true},
+                {withoutSchemaLine(pmml), DocumentKind::TreeDisplay, false}};
     for (const auto& row : rows)
         EXPECT_EQ(parser.parse(row.text, "test", kFailure, row.kind) != nullptr, row.valid)
             << row.text.substr(0, 300);
@@ -297,9 +267,9 @@ TEST(GrammarPools, EachKindIsReadOncePerFolderForEveryParserOnEveryThread) {
                                  withoutSchemaLine(example("templates/presentation.sgt")),
                                  withoutSchemaLine(example("data/area.xml"))};
     const unsigned base = XercesRuntime::references();
-    unsigned before[3];
-    for (int k = 0; k < 3; ++k)
-        before[k] = ValidatingParser::grammarLoads(kinds[k]);
+    const unsigned before[] = {ValidatingParser::grammarLoads(kinds[0]),
+                               ValidatingParser::grammarLoads(kinds[1]),
+                               ValidatingParser::grammarLoads(kinds[2])};
     const auto readAll = [&](int threadCount) {
         XercesRuntime up;
         std::vector<int> valid(threadCount, 0);
@@ -327,7 +297,6 @@ TEST(XercesRuntimeCount, CopiesAreReferencesAndTheLastOneTerminates) {
     {
         XercesRuntime first;
         ASSERT_TRUE(first.ready());
-        EXPECT_EQ(XercesRuntime::references(), base + 1);
         XercesRuntime second(first);
         EXPECT_EQ(XercesRuntime::references(), base + 2);
         second = first;
