@@ -11,6 +11,8 @@
 #include <xercesc/dom/DOMException.hpp>
 #include <xercesc/framework/MemBufInputSource.hpp>
 #include <xercesc/framework/XMLGrammarPoolImpl.hpp>
+#include <xercesc/validators/schema/ComplexTypeInfo.hpp>
+#include <xercesc/validators/schema/SchemaGrammar.hpp>
 #include <xercesc/internal/XMLScanner.hpp>
 #include <xercesc/parsers/XercesDOMParser.hpp>
 #include <xercesc/sax/Locator.hpp>
@@ -210,6 +212,33 @@ private:
         cache.pools_.clear();
     }
 
+    // Xerces builds a type's content model and attribute list on first use and keeps them in the
+    // grammar. Built here, before the pool is shared, so no two parsers race to build (and leak)
+    // the same one.
+    static void buildLazyParts(XMLGrammarPool& pool) {
+        RefHashTableOfEnumerator<Grammar> grammars = pool.getGrammarEnumerator();
+        while (grammars.hasMoreElements()) {
+            Grammar& grammar = grammars.nextElement();
+            if (grammar.getGrammarType() != Grammar::SchemaGrammarType)
+                continue;
+            const auto& schema = static_cast<const SchemaGrammar&>(grammar);
+            if (RefHashTableOf<ComplexTypeInfo>* types = schema.getComplexTypeRegistry()) {
+                RefHashTableOfEnumerator<ComplexTypeInfo> each(types, false, XMLPlatformUtils::fgMemoryManager);
+                while (each.hasMoreElements()) {
+                    ComplexTypeInfo& type = each.nextElement();
+                    type.getContentModel();
+                    type.getAttDefList();
+                }
+            }
+            RefHash3KeysIdPoolEnumerator<SchemaElementDecl> elements = schema.getElemEnumerator();
+            while (elements.hasMoreElements())
+                if (ComplexTypeInfo* type = elements.nextElement().getComplexTypeInfo()) {
+                    type->getContentModel();
+                    type->getAttDefList();
+                }
+        }
+    }
+
     static Pool load(DocumentKind kind, std::vector<std::string>& errors) {
         Pool loaded = std::make_shared<LoadedPool>();
         RecordingHandler handler(errors);
@@ -236,6 +265,12 @@ private:
             return nullptr;
         } catch (...) {
             errors.push_back(std::string("the grammar ") + grammarFile(kind) + " cannot be read");
+            return nullptr;
+        }
+        try {
+            buildLazyParts(loaded->pool);
+        } catch (...) {
+            errors.push_back(std::string("the grammar ") + grammarFile(kind) + " cannot be prepared");
             return nullptr;
         }
         loaded->pool.lockPool();

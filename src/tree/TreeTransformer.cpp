@@ -228,18 +228,21 @@ DOMDocument* TreeTransformer::displayDocument() const {
 }
 
 void TreeTransformer::SetOrientation(TreeOrientation orientation) {
+    // A host may pass any number: it is read once, as a number, before it is trusted.
+    const int value = orientation;
     guarded(kFile, 520, "SetOrientation fatal error", [&] {
         DOMElement* element = impl_->option(kTreeOrientation);
-        if (orientation >= TOP_DOWN && orientation <= RIGHT_TO_LEFT)
-            Impl::set(element, kOrientation, kOrientations[orientation]);
+        if (value >= TOP_DOWN && value <= RIGHT_TO_LEFT)
+            Impl::set(element, kOrientation, kOrientations[value]);
     });
 }
 
 void TreeTransformer::SetTreeDisplayOption(TreeDisplayOption option) {
+    const int value = option;
     guarded(kFile, 545, "SetTreeDisplayOption fatal error", [&] {
         DOMElement* element = impl_->option(kNodeContents);
-        if (option >= TABLE && option <= BOTH)
-            Impl::set(element, kContents, kDisplayOptions[option]);
+        if (value >= TABLE && value <= BOTH)
+            Impl::set(element, kContents, kDisplayOptions[value]);
     });
 }
 

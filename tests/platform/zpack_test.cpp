@@ -217,7 +217,9 @@ TEST_F(ZpackLimit, CapAppliesPastTheDirectlyWrittenPartWithLittleMemory) {
     });
     EXPECT_TRUE(refused);
     RecordProperty("peak_growth_kib", static_cast<int>(growthKiB));
+#ifndef __SANITIZE_ADDRESS__ // the sanitizer's quarantine holds freed blocks and inflates the peak
     if (growthKiB >= 0) {
         EXPECT_LT(growthKiB, 100L << 10) << "peak resident size grew by " << growthKiB << " KiB";
     }
+#endif
 }

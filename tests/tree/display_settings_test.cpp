@@ -79,7 +79,6 @@ TEST(TreeDisplay, ColoursOverwriteInOrderThenAppend) {
         {TreeTransformer::CHART_COLORS, {"#FFCCCCCC"}, {"#FFCCCCCC", "#FFBBBBBB"}, {}},
         {TreeTransformer::CHART_COLORS, {}, {"#FFCCCCCC", "#FFBBBBBB"}, {}},
         {TreeTransformer::SWATCH_COLORS, {"#FF000001"}, {"#FFCCCCCC", "#FFBBBBBB"}, {"#FF000001"}},
-        {static_cast<TreeTransformer::ColorIds>(2), {"#FF000002"}, {"#FFCCCCCC", "#FFBBBBBB"}, {"#FF000001"}},
     };
     for (const auto& step : steps) {
         SCOPED_TRACE(&step - steps);
