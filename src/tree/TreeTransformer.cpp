@@ -12,6 +12,8 @@
 
 #include <xercesc/dom/DOM.hpp>
 #include <xercesc/util/XMLString.hpp>
+#include <xercesc/util/XMLUni.hpp>
+#include <xercesc/validators/schema/SchemaSymbols.hpp>
 
 #include <sstream>
 #include <utility>
@@ -419,7 +421,16 @@ bool TreeTransformer::mergeDOM(const DOMDocument* from, DOMDocument* to) {
     DOMElement* target = to ? to->getDocumentElement() : nullptr;
     if (source == nullptr || target == nullptr)
         return false;
-    mergeAttributes(source, target);
+    // The root's own attributes only: the text's namespace declarations and schema location stay
+    // behind, so what is printed names the bundled grammar, not a file the text made up.
+    const DOMNamedNodeMap* attributes = source->getAttributes();
+    for (XMLSize_t i = 0, count = attributes->getLength(); i < count; ++i) {
+        const DOMNode* attribute = attributes->item(i);
+        const XMLCh* uri = attribute->getNamespaceURI();
+        if (XMLString::equals(uri, SchemaSymbols::fgURI_XSI) || XMLString::equals(uri, XMLUni::fgXMLNSURIName))
+            continue;
+        target->setAttribute(attribute->getNodeName(), attribute->getNodeValue());
+    }
     for (const DOMNode* child = source->getFirstChild(); child; child = child->getNextSibling())
         target->appendChild(to->importNode(child, true));
     return true;
