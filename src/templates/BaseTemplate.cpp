@@ -113,9 +113,11 @@ GrxStyle& BaseTemplate::addStyle(GrxBaseElement& element, const XMLCh* id) {
 }
 
 std::uint32_t BaseTemplate::getGraphs(std::vector<GrrUviza*>& graphs) const {
-    const std::vector<GrrUviza*> selected = plotaid::detail::selectedGraphs(target_, instruction_);
+    // One walk serves both the selection and the count.
+    const std::vector<GrrUviza*> all = plotaid::detail::allGraphs(target_);
+    const std::vector<GrrUviza*> selected = plotaid::detail::selectedGraphs(all, instruction_);
     graphs.insert(graphs.end(), selected.begin(), selected.end());
-    return static_cast<std::uint32_t>(plotaid::detail::allGraphs(target_).size());
+    return static_cast<std::uint32_t>(all.size());
 }
 
 std::vector<GrxLegend*> BaseTemplate::getLegends() const {

@@ -45,8 +45,7 @@ std::vector<GrrUviza*> allGraphs(const GrxVisualization& target) {
     return graphs;
 }
 
-std::vector<GrrUviza*> selectedGraphs(const GrxVisualization& target, const DOMElement* instruction) {
-    std::vector<GrrUviza*> graphs = allGraphs(target);
+std::vector<GrrUviza*> selectedGraphs(const std::vector<GrrUviza*>& graphs, const DOMElement* instruction) {
     const std::uint32_t wanted = unsignedAttribute(instruction, GrxUni::_graph);
     if (wanted == 0)
         return graphs;

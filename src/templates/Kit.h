@@ -31,8 +31,9 @@ using XERCES_CPP_NAMESPACE::DOMNode;
 // cost each look-up a pass over every data element.
 std::vector<GrrUviza*> allGraphs(const GrxVisualization& target);
 
-// The graphs an instruction's "graph" attribute selects: its number from 1, or all for 0 or none.
-std::vector<GrrUviza*> selectedGraphs(const GrxVisualization& target, const DOMElement* instruction);
+// Of `graphs` (the chart's, in order), those an instruction's "graph" attribute selects: its
+// number from 1, or all for 0 or none.
+std::vector<GrrUviza*> selectedGraphs(const std::vector<GrrUviza*>& graphs, const DOMElement* instruction);
 
 // Points, lines, edges, paths, intervals, areas, polygons, schemas: kind by kind.
 std::vector<CTElementType*> elementsOf(const GrrUviza& graph);
