@@ -21,11 +21,16 @@ class CTVariableType;
 class GrrUviza;
 class GrxAxis;
 class GrxBaseElement;
+class GrxCategoricalDomain;
 class GrxDimension;
 class GrxFormat;
+class GrxGridline;
 class GrxInterval;
+class GrxLabel;
 class GrxLabeling;
 class GrxLegend;
+class GrxMajorTicks;
+class GrxMinorTicks;
 class GrxStyle;
 class GrxStyleBy;
 class GrxStyleCycle;
@@ -97,6 +102,33 @@ public:
     void importStringFormat(GrxFormat& format, const XERCES_CPP_NAMESPACE::DOMElement* element);
     void importDateTimeFormat(GrxFormat& format, const XERCES_CPP_NAMESPACE::DOMElement* element);
     void importElapsedTimeFormat(GrxFormat& format, const XERCES_CPP_NAMESPACE::DOMElement* element);
+
+    // The tick, grid-line and label parts of an axis instruction (its majorTicks, minorTicks or
+    // label element): parts and styles that are missing are made, then the element's styles and
+    // formats are imported. "styleOnly" never adds ticks; with it, minor ticks are only restyled.
+    void setMajorTicks(GrxAxis& axis, const XERCES_CPP_NAMESPACE::DOMElement* element);
+    void setMinorTicks(GrxAxis& axis, const XERCES_CPP_NAMESPACE::DOMElement* element);
+    void styleMajorTicks(GrxMajorTicks& ticks, const XERCES_CPP_NAMESPACE::DOMElement* element);
+    void styleMinorTicks(GrxMinorTicks& minor, const XERCES_CPP_NAMESPACE::DOMElement* element,
+                         GrxMajorTicks* major);
+    // A new grid-line style takes the colour of `from` (may be null).
+    void styleGridLines(GrxStyle* from, GrxGridline& gridline, const XERCES_CPP_NAMESPACE::DOMElement* element);
+    void styleLabel(GrxLabel& label, const XERCES_CPP_NAMESPACE::DOMElement* element);
+    // The label's texts become the element's own text with its date and time placeholders filled
+    // in the user's language; an element without text leaves the label as it is.
+    void mergeText(const XERCES_CPP_NAMESPACE::DOMElement* element, GrxLabel& label);
+
+    // Category look-ups on a graph of the target, for role x, y, "y2", z (and legend where said).
+    bool isRoleCategorical(const GrrUviza& graph, const ChartString& role) const;
+    // With an element, its own x or z variable (or, for legend, its aesthetics) answers first.
+    GrxCategoricalDomain* getCategoricalDomain(const GrrUviza& graph, const ChartString& role,
+                                               const CTElementType* element) const;
+    // Aesthetic variables, in element and kind order, repeats kept: all of them for legend, else
+    // those that are the element's variable of the role.
+    std::vector<CTVariableType*> getLegendVariables(const GrrUviza& graph, const ChartString& role) const;
+    // The category value whose relabel reads `label` (first format of each variable only); empty
+    // when none does.
+    ChartString getCategoryValue(const GrrUviza& graph, const XMLCh* role, const ChartString& label) const;
 
     // Cloning one object of the target into another: every copied aesthetic gets a fresh id.
     // Every attribute but the id; returns how many were copied.

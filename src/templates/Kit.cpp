@@ -148,6 +148,41 @@ const DOMElement* firstChildNamed(const DOMElement* parent, const XMLCh* name) {
     return nullptr;
 }
 
+std::vector<const DOMElement*> descendantsNamed(const DOMElement* element, const XMLCh* name) {
+    std::vector<const DOMElement*> found;
+    if (element == nullptr)
+        return found;
+    // Iterative preorder: a hostile template's depth must not become stack depth.
+    const DOMElement* node = element->getFirstElementChild();
+    while (node != nullptr) {
+        if (named(node, name))
+            found.push_back(node);
+        if (const DOMElement* child = node->getFirstElementChild()) {
+            node = child;
+            continue;
+        }
+        while (node != nullptr && node != element && node->getNextElementSibling() == nullptr)
+            node = static_cast<const DOMElement*>(node->getParentNode());
+        node = (node == nullptr || node == element) ? nullptr : node->getNextElementSibling();
+    }
+    return found;
+}
+
+const DOMElement* firstDescendantNamed(const DOMElement* element, const XMLCh* name) {
+    const std::vector<const DOMElement*> found = descendantsNamed(element, name);
+    return found.empty() ? nullptr : found.front();
+}
+
+ChartString directText(const DOMElement* element) {
+    std::u16string text;
+    if (element == nullptr)
+        return ChartString();
+    for (const DOMNode* n = element->getFirstChild(); n; n = n->getNextSibling())
+        if (n->getNodeType() == DOMNode::TEXT_NODE)
+            text += n->getNodeValue();
+    return ChartString(text.c_str());
+}
+
 const DOMElement* lastChildNamed(const DOMElement* parent, const XMLCh* name) {
     if (parent == nullptr)
         return nullptr;

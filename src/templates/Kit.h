@@ -103,6 +103,11 @@ const DOMElement* firstChildNamed(const DOMElement* parent, const XMLCh* name);
 // A template may repeat a child; where one counts, the last one does.
 const DOMElement* lastChildNamed(const DOMElement* parent, const XMLCh* name);
 std::vector<const DOMElement*> childrenNamed(const DOMElement* parent, const XMLCh* name);
+// Descendants at any depth, in document order; the element itself is not one of them.
+std::vector<const DOMElement*> descendantsNamed(const DOMElement* element, const XMLCh* name);
+const DOMElement* firstDescendantNamed(const DOMElement* element, const XMLCh* name);
+// The element's own text: its direct text children joined, nested elements' text left out.
+ChartString directText(const DOMElement* element);
 
 // What a cycle instruction says: which aesthetics (0: all, n: the n-th of each element) and the
 // styles of their new cycle (the last "cycle" child; none changes no cycle).
