@@ -22,6 +22,10 @@ class GrxFormat;
 class GrxVisualization;
 class Kovar_Format;
 
+namespace msgbook {
+class FacSTDictionary;
+}
+
 // Tags ordered by their text; the set does not own them.
 struct ConstChartStringLess {
     bool operator()(const XMLCh* a, const XMLCh* b) const {
@@ -72,6 +76,13 @@ public:
     static bool FormatDate(GrxFormat& format, const Kovar_Format& hostFormat);
     static bool FormatElapsedTime(GrxFormat& format, const Kovar_Format& hostFormat);
     static bool FormatCustomCurrency(GrxFormat& format, const Kovar_Format& hostFormat);
+
+    // Fills the date and time placeholders of a chart text ("@@current_date@@", ")TIME", ...) from
+    // the local time of the call. Month and weekday names and the a.m./p.m. word are the
+    // dictionary's words for the English ones, host text in the code page `encoding`; without a
+    // dictionary, or for a word it lacks or that does not transcode, that placeholder stays.
+    static void updateText(ChartString& text, const msgbook::FacSTDictionary* dictionary,
+                           const std::string& encoding);
 
     // New chart documents owned by the caller (free them with releaseDocument): an older-form
     // "graph" root or a "visualization" root, in the chart namespace with its schema location.

@@ -10,6 +10,7 @@
 #include <plotaid/ChartStyleValue.h>
 #include <plotaid/ChartTemplate.h>
 #include <plotaid/ChartTransformer.h>
+#include <plotaid/ChartTranscoder.h>
 #include <plotaid/Kovar_Format.h>
 #include <plotaid/splitInfo.h>
 #include <plotaid/TimeConverter.h>

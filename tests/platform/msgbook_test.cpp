@@ -80,6 +80,20 @@ TEST_F(Messages, NamesThatCouldLeaveTheFolderReadNothing) {
     EXPECT_EQ(msgbook::FacSTDictionary("", "en").LookUp("k"), "k");
 }
 
+TEST_F(Messages, OverALanguageFolderOfTheMessagesFolder) {
+    write("GRAPH.de.txt", "k\tde word\n");
+    const std::pair<std::string, const char*> cases[] = {
+        {folder + "messages/de/", "de word"}, {folder + "messages/de", "de word"},
+        {folder + "de/", "k"},                {folder + "messages/../de/", "k"},
+        {folder + "messages/", "k"},          {"de", "k"},
+    };
+    for (const auto& [path, word] : cases) {
+        msgbook::FacSTDictionary d = msgbook::FacSTDictionary::overLanguageFolder(path);
+        d.SetProcedure("GRAPH");
+        EXPECT_EQ(d.LookUp("k"), word) << path;
+    }
+}
+
 TEST_F(Messages, OverlongLinesAndFilesAreCutNotLoadedWhole) {
     const std::string longText(msgbook::FacSTDictionary::kMaxLineBytes + 100, 'x');
     std::string big;

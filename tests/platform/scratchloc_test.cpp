@@ -1,5 +1,6 @@
 #include "support/TestSupport.h"
 
+#include <msgbook/FacSTDictionary.h>
 #include <scratchloc/PathFactory.h>
 #include <scratchloc/ResourceFolder.h>
 
@@ -41,6 +42,22 @@ TEST(ScratchlocPathFactory, ServesOnlyTheResourceFolderAndReadsTheVariableEachCa
         EXPECT_EQ(resourcePath(), sourceResources);
     }
     EXPECT_TRUE(fs::is_directory(sourceResources));
+}
+
+// The language folders are a view of the messages folder, led by the host language.
+TEST(ScratchlocPathFactory, LanguageFolderFollowsTheHostLanguage) {
+    ScopedEnv variable("PLOTAID_RESOURCE_DIR", "/opt/res");
+    const scratchloc::PathFinder& finder = *PathFactory::getPathInstance(PathFactory::ResourceFolder);
+    const std::string before = msgbook::hostLanguage();
+    const std::pair<const char*, const char*> cases[] = {
+        {"de", "/opt/res/messages/de/"}, {"zh_tw", "/opt/res/messages/zh_tw/"}, {"../x", "/opt/res/messages/"}};
+    for (const auto& [language, full] : cases) {
+        msgbook::setHostLanguage(language);
+        EXPECT_EQ(finder.getFullPath(), full) << language;
+    }
+    msgbook::setHostLanguage(before);
+    EXPECT_EQ(finder.getBasePath(), "/opt/res/messages/");
+    EXPECT_EQ(finder.getPath(), "/opt/res/");
 }
 
 TEST(ScratchlocResourceFolder, FindsShareBesideBinOrLibOfThisProgram) {

@@ -61,6 +61,12 @@ TEST(Tool, CommandLinesWithoutFiles) {
         {"decompress -h", 0, {"--limit BYTES"}},
         {"validate", 2, {}},
         {"validate --help", 0, {"usage: plotaid validate FILE..."}},
+        {"text --language de --at 2026-03-04T09:05:07 '@@current_weekday@@ @@current_monthname@@ )TIME' x",
+         0,
+         {"Mittwoch März 9:05:07 vorm.\nx\n"}},
+        {"text --at 2026-02-29T09:05:07 x", 2, {"'2026-02-29T09:05:07' is not a moment"}},
+        {"text --language de --bogus x", 2, {"unknown option '--bogus'"}},
+        {"text --language", 2, {"--language needs a value"}},
     };
     for (const auto& c : cases) {
         SCOPED_TRACE(c.args);

@@ -12,6 +12,12 @@ std::string& languageSetting() {
     return language;
 }
 
+const char* const kCommon = "common";
+const char* const kEnglish = "en";
+const char* const kMessages = "/messages/";
+
+} // namespace
+
 // Names become parts of a file name: anything that could leave the messages folder (or is not a
 // plain word) names no table at all.
 bool isPlainName(const std::string& name) {
@@ -26,11 +32,6 @@ bool isPlainName(const std::string& name) {
     return true;
 }
 
-const char* const kCommon = "common";
-const char* const kEnglish = "en";
-
-} // namespace
-
 void setHostLanguage(const std::string& language) {
     languageSetting() = language;
 }
@@ -42,6 +43,22 @@ FacSTDictionary::FacSTDictionary(std::string folder) : FacSTDictionary(std::move
 
 FacSTDictionary::FacSTDictionary(std::string folder, std::string language)
     : folder_(std::move(folder)), language_(std::move(language)) {}
+
+FacSTDictionary FacSTDictionary::overLanguageFolder(const std::string& path) {
+    std::string folder = path;
+    while (!folder.empty() && folder.back() == '/')
+        folder.pop_back();
+    const std::string::size_type slash = folder.find_last_of('/');
+    if (slash == std::string::npos)
+        return FacSTDictionary(std::string(), std::string());
+    std::string language = folder.substr(slash + 1);
+    folder.erase(slash + 1);
+    const std::string messages(kMessages);
+    if (folder.size() < messages.size() || folder.compare(folder.size() - messages.size(), messages.size(), messages) != 0)
+        return FacSTDictionary(std::string(), std::string());
+    folder.erase(folder.size() - messages.size() + 1);
+    return FacSTDictionary(std::move(folder), std::move(language));
+}
 
 void FacSTDictionary::SetProcedure(const std::string& procedure) {
     procedure_ = procedure;

@@ -1,6 +1,8 @@
 #include <scratchloc/PathFactory.h>
 #include <scratchloc/ResourceFolder.h>
 
+#include <msgbook/FacSTDictionary.h>
+
 #include <cstdlib>
 #include <dlfcn.h>
 #include <limits.h>
@@ -40,6 +42,12 @@ public:
         if (!installed.empty())
             return installed;
         return withTrailingSlash(PLOTAID_SOURCE_RESOURCE_DIR);
+    }
+    std::string getBasePath() const override { return getPath() + "messages/"; }
+    // A host language that is no plain folder name would lead out of the folder: the base stands.
+    std::string getFullPath() const override {
+        const std::string language = msgbook::hostLanguage();
+        return msgbook::isPlainName(language) ? getBasePath() + language + "/" : getBasePath();
     }
 };
 

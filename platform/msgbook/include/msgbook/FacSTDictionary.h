@@ -15,11 +15,18 @@ namespace msgbook {
 void setHostLanguage(const std::string& language);
 std::string hostLanguage();
 
+// Whether a procedure or language name can be part of a table's file name: a plain word of letters,
+// digits, '_' and '-', at most 64 characters.
+bool isPlainName(const std::string& name);
+
 class FacSTDictionary {
 public:
     // folder: the resource folder, ending with '/'.
     explicit FacSTDictionary(std::string folder);
     FacSTDictionary(std::string folder, std::string language);
+    // Over a language folder <resource folder>messages/<language>/ (the trailing '/' optional): the
+    // tables stay messages/<procedure>.<language>.txt. A path of another form names no table.
+    static FacSTDictionary overLanguageFolder(const std::string& path);
 
     void SetProcedure(const std::string& procedure);
     const std::string& GetProcedure() const { return procedure_; }
