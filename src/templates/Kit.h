@@ -9,6 +9,7 @@
 #include <plotaid/BaseTemplate.h>
 
 #include <grx/ChartString.h>
+#include <grx/GrxEnums.h>
 #include <grx/GrxModel.h>
 #include <grx/GrxUni.h>
 
@@ -84,6 +85,16 @@ template <class T> std::vector<T*> allOfKind(const GrxVisualization& target, con
 GrxStyle* styleWithId(const GrxVisualization& target, const XMLCh* id);
 
 // ---- instruction readers ----------------------------------------------------------------------------
+
+// The enumeration value whose word `word` is; false (value untouched) for any other word.
+template <std::size_t N> bool wordValue(const grx::EnumWord (&table)[N], const ChartString& word, int& value) {
+    for (const grx::EnumWord& entry : table)
+        if (word.equals(entry.word)) {
+            value = entry.value;
+            return true;
+        }
+    return false;
+}
 
 inline bool hasText(const XMLCh* text) {
     return text != nullptr && *text != 0;

@@ -2,6 +2,7 @@
 // Missing parts are made; what the instruction's elements declare is imported into them.
 
 #include "templates/Kit.h"
+#include "templates/Localise.h"
 
 #include <plotaid/BaseTemplate.h>
 
@@ -18,16 +19,6 @@ namespace {
 constexpr XMLCh kDeltaUnit[] = u"deltaUnit";
 constexpr XMLCh kFacetStyle[] = u"facetStyle";
 constexpr XMLCh kAuto[] = u"auto";
-
-// The enumeration value whose word the attribute holds; false for any other word.
-template <std::size_t N> bool wordValue(const grx::EnumWord (&table)[N], const ChartString& word, int& value) {
-    for (const grx::EnumWord& entry : table)
-        if (word.equals(entry.word)) {
-            value = entry.value;
-            return true;
-        }
-    return false;
-}
 
 const DOMElement* gridLinesOf(const DOMElement* element) {
     return firstDescendantNamed(element, BaseTemplate::_gridLines);
@@ -198,4 +189,15 @@ void BaseTemplate::styleLabel(GrxLabel& label, const DOMElement* element) {
     }
     for (const DOMElement* declared : descendantsNamed(element, GrxUni::_style))
         importStyle(declared, unsignedAttribute(declared, GrxUni::_number) == 1 ? frame : style);
+}
+
+void BaseTemplate::mergeText(const DOMElement* element, GrxLabel& label) {
+    if (element == nullptr)
+        return;
+    ChartString text = directText(element);
+    localiseChartText(text);
+    if (text.empty())
+        return;
+    label.removeTexts();
+    label.addText().setText(text);
 }

@@ -136,6 +136,9 @@ TEST_F(Designer, EachTemplateDoesWhatItIsFor) {
         {"monochrome.sgt", "line-series.xml", "color_1", "variable=var_region domain=domain_region"},
         // Presentation: major ticks grow, minor ticks stay.
         {"presentation.sgt", "line-series.xml", "dim_x_majorTicks", "length=8pt"},
+        // Axis instructions: the axes' own style, and the tick labels' style of every axis.
+        {"presentation.sgt", "scatter.xml", "tickLabelStyle", "font-size=12pt"},
+        {"corporate.sgt", "scatter.xml", "axisStyle", "color2=#1F4E79 stroke-width=0.75pt"},
     };
     for (const auto& row : rows) {
         const GrxVisualization& chart = applied(row.chart, {row.templateName});
