@@ -127,6 +127,16 @@ TEST_F(Conversion, TheRootNamesTheConvertedGrammarAndAFailedParseConvertsNothing
     EXPECT_EQ(error, "t:1:7: unexpected end of input");
 }
 
+// A parse stopped by a fault late in the text converts what it read before it.
+TEST_F(Conversion, AParseThatStoppedHandsOnWhatItBuilt) {
+    ChartTemplate t(empty(), nullptr);
+    ASSERT_TRUE(t.setTemplate(older("<frame id='f'><location/></frame><style id='d'/><style id='d'/>")));
+    WalkReport report;
+    t.applyTemplate();
+    ASSERT_EQ(report.outcomes().size(), 1u);
+    EXPECT_EQ(report.outcomes().front().tag, "addFrame");
+}
+
 // Each stored template restyles every sample chart as its twin does, and its conversion is the twin.
 TEST_F(Conversion, EarlierFormExamplesDoWhatTheirTwinsDo) {
     for (const char* name : {"axes", "frames", "lines", "styles"}) {
