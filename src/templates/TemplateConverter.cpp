@@ -155,14 +155,12 @@ bool hasCurrentTemplateOutline(std::string_view text, std::string& notXml) {
 
 namespace {
 
-constexpr XMLCh kStyleBy[] = u"styleby";
 constexpr XMLCh kMajorOld[] = u"majorticks";
 constexpr XMLCh kMinorOld[] = u"minorticks";
 constexpr XMLCh kGridLinesOld[] = u"gridlines";
 constexpr XMLCh kFacetStyleOld[] = u"facetstyle";
 constexpr XMLCh kCoordinateTransform[] = u"coordinatetransform";
 constexpr XMLCh kCoordinateFacet[] = u"coordinatefacet";
-constexpr XMLCh kFacetVariable[] = u"facetvariable";
 constexpr XMLCh kAggregateSmall[] = u"aggregatesmall";
 constexpr XMLCh kLabelAngleOld[] = u"labelangle";
 constexpr XMLCh kTickLabelStyle[] = u"tickLabelStyle";

@@ -27,9 +27,9 @@ using plotaid::detail::isNamed;
 
 namespace {
 
-constexpr XMLCh kFacetVariable[] = u"facetvariable";
+using plotaid::detail::kFacetVariable;
+using plotaid::detail::kStyleBy;
 constexpr XMLCh kFacetLabel[] = u"facetlabel";
-constexpr XMLCh kStyleBy[] = u"styleby";
 constexpr XMLCh kLegendTarget[] = u"legendtarget";
 constexpr XMLCh kHistogram[] = u"histogram";
 constexpr XMLCh kTukeyInnerFence[] = u"tukeyInnerFence";

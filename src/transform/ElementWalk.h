@@ -9,6 +9,10 @@
 
 namespace plotaid::detail {
 
+// Names of the older chart form that the object model does not know.
+constexpr XMLCh kFacetVariable[] = u"facetvariable";
+constexpr XMLCh kStyleBy[] = u"styleby";
+
 inline bool isNamed(const XERCES_CPP_NAMESPACE::DOMNode* node, const XMLCh* tag) {
     return node != nullptr && node->getNodeType() == XERCES_CPP_NAMESPACE::DOMNode::ELEMENT_NODE &&
            XERCES_CPP_NAMESPACE::XMLString::equals(node->getNodeName(), tag);
