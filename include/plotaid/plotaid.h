@@ -3,14 +3,25 @@
 
 // Everything a host needs: one header per exported class.
 #include <plotaid/BaseTemplate.h>
+#include <plotaid/ChartAxis.h>
 #include <plotaid/ChartBase.h>
+#include <plotaid/ChartDimension.h>
+#include <plotaid/ChartElement.h>
+#include <plotaid/ChartElementElement.h>
 #include <plotaid/ChartErrorHandler.h>
 #include <plotaid/ChartException.h>
+#include <plotaid/ChartFacetLabel.h>
+#include <plotaid/ChartFacetLabeling.h>
+#include <plotaid/ChartFrame.h>
+#include <plotaid/ChartGraph.h>
+#include <plotaid/ChartGuide.h>
 #include <plotaid/ChartKey.h>
+#include <plotaid/ChartParameter.h>
 #include <plotaid/ChartStyleValue.h>
 #include <plotaid/ChartTemplate.h>
 #include <plotaid/ChartTransformer.h>
 #include <plotaid/ChartTranscoder.h>
+#include <plotaid/ChartVariable.h>
 #include <plotaid/Kovar_Format.h>
 #include <plotaid/splitInfo.h>
 #include <plotaid/TimeConverter.h>

@@ -310,6 +310,8 @@ struct ValidatingParser::Impl {
     std::array<Slot, kKinds> slots;
     Parser* last = nullptr;
     DOMDocument* document = nullptr;
+    // What a failed parse built before it stopped; it lives until the next parse.
+    DOMDocument* partial = nullptr;
 
     Impl() { security.setEntityExpansionLimit(kEntityExpansionLimit); }
 
@@ -373,6 +375,7 @@ DOMDocument* ValidatingParser::parse(std::string_view text, const char* systemId
     Impl& in = *impl_;
     in.errors.clear();
     in.document = nullptr;
+    in.partial = nullptr;
     if (in.last != nullptr) {
         // The previous document dies here unless it was adopted.
         try {
@@ -409,10 +412,15 @@ DOMDocument* ValidatingParser::parse(std::string_view text, const char* systemId
             in.errors.push_back("unknown failure");
         }
         try {
-            parser->resetDocumentPool();
+            in.partial = parser->getDocument();
+            if (in.partial == nullptr) {
+                parser->resetDocumentPool();
+                in.last = nullptr;
+            }
         } catch (...) {
+            in.partial = nullptr;
+            in.last = nullptr;
         }
-        in.last = nullptr;
     }
     try {
         ChartBase::printString(std::string(text), "parseError_", ".xml", 0, ChartBase::PRINT_XML_WITH_POPUPS);
@@ -420,6 +428,10 @@ DOMDocument* ValidatingParser::parse(std::string_view text, const char* systemId
     }
     ChartErrorHandler().error(failure);
     return nullptr;
+}
+
+const DOMDocument* ValidatingParser::partialDocument() const noexcept {
+    return impl_->partial;
 }
 
 OwnedDocument ValidatingParser::adoptDocument() {

@@ -65,6 +65,10 @@ public:
                                              const ChartException& failure,
                                              DocumentKind kind = DocumentKind::Named);
 
+    // After a failed parse, the part of the document built before the parse stopped (null when
+    // none), owned by this parser until its next parse.
+    const XERCES_CPP_NAMESPACE::DOMDocument* partialDocument() const noexcept;
+
     // Hands the document of the last successful parse to the caller; null when there is none.
     OwnedDocument adoptDocument();
 

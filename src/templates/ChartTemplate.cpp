@@ -57,7 +57,9 @@ DOMElement* ChartTemplate::parseTemplate(const std::string& text) {
     parser_->failureLogged = currentForm && parsed == nullptr;
     if (!currentForm) {
         // The converted text is read as the current form, so this recursion ends here.
-        const std::string converted = plotaid::detail::convertTemplate(parsed);
+        // A parse that stopped early hands on what it built.
+        const std::string converted =
+            plotaid::detail::convertTemplate(parsed ? parsed : parser.partialDocument());
         ChartBase::printString(converted, "template_converted_", ".sgt",
                                plotaid::detail::nextConversionCount(), ChartBase::PRINT_CONVERTED_TEMPLATE);
         if (converted.find(kConvertedGrammar) == std::string::npos)

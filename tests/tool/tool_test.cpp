@@ -67,6 +67,11 @@ TEST(Tool, CommandLinesWithoutFiles) {
         {"text --at 2026-02-29T09:05:07 x", 2, {"'2026-02-29T09:05:07' is not a moment"}},
         {"text --language de --bogus x", 2, {"unknown option '--bogus'"}},
         {"text --language", 2, {"--language needs a value"}},
+        {"template --help", 0, {"usage: plotaid template convert OLD [-o NEW]"}},
+        {"template", 2, {"no action given (convert)"}},
+        {"template upgrade x", 2, {"unknown action 'upgrade'"}},
+        {"template convert", 2, {"no template given"}},
+        {"template convert /nonexistent.xml", 1, {"/nonexistent.xml: cannot open"}},
     };
     for (const auto& c : cases) {
         SCOPED_TRACE(c.args);
@@ -120,6 +125,23 @@ TEST(ToolValidate, EachFileGetsALineAndAnyFaultFailsTheRun) {
     EXPECT_TRUE(has(r, "'chart'") && has(r, "Bogus") && has(r, "root element 'style'")) << r.output;
     EXPECT_TRUE(has(r, kCharts + "pie.xml: valid") && has(r, settings + ": valid")) << r.output;
     EXPECT_EQ(runTool("validate '" + kCharts + "pie.xml' '" + kCharts + "boxplot.xml'").exitCode, 0);
+}
+
+// The converted template goes to the file named, and is one the library reads; a template of the
+// current form or one that is not XML is refused with the reason.
+TEST(ToolTemplate, ConvertsEarlierFormsOnly) {
+    useSourceGrammars();
+    const std::string earlier = std::string(PLOTAID_EXAMPLES_DIR) + "/templates/earlier/axes.xml";
+    const std::string out = writeScratch("converted.sgt", "");
+    ASSERT_EQ(runTool("template convert '" + earlier + "' -o '" + out + "'").exitCode, 0);
+    EXPECT_NE(readText(out).find("<setAxisMajorTicks"), std::string::npos);
+    EXPECT_TRUE(has(runTool("validate '" + out + "'"), ": valid (template, grxml-template-1.0.xsd)"));
+    const ToolResult current = runTool("template convert '" + out + "'");
+    EXPECT_EQ(current.exitCode, 1);
+    EXPECT_TRUE(has(current, "of the current form already")) << current.output;
+    const ToolResult broken = runTool("template convert '" + writeScratch("broken.xml", "<graph>") + "'");
+    EXPECT_EQ(broken.exitCode, 1);
+    EXPECT_TRUE(has(broken, "broken.xml:1:8: ")) << broken.output;
 }
 
 } // namespace
