@@ -7,6 +7,7 @@
 #include <xercesc/util/XMLString.hpp>
 
 #include <sstream>
+#include <utility>
 
 using namespace XERCES_CPP_NAMESPACE;
 
@@ -180,7 +181,7 @@ ChartString directText(const DOMElement* element) {
     for (const DOMNode* n = element->getFirstChild(); n; n = n->getNextSibling())
         if (n->getNodeType() == DOMNode::TEXT_NODE)
             text += n->getNodeValue();
-    return ChartString(text.c_str());
+    return ChartString(std::move(text));
 }
 
 const DOMElement* lastChildNamed(const DOMElement* parent, const XMLCh* name) {
@@ -207,6 +208,34 @@ CycleInstruction::CycleInstruction(const DOMElement* instruction)
     : aestheticNumber(unsignedAttribute(instruction, GrxUni::_aestheticNumber)),
       cycle(lastChildNamed(instruction, GrxUni::_cycle)) {}
 
+namespace {
+template <class T> bool isA(const CTElementType& element) {
+    return dynamic_cast<const T*>(&element) != nullptr;
+}
+bool noElement(const CTElementType&) {
+    return false;
+}
+} // namespace
+
+ElementKind::ElementKind(const DOMElement* instruction) {
+    static const struct {
+        const XMLCh* word;
+        bool (*accepts)(const CTElementType&);
+    } kinds[] = {
+        {GrxArea::getElementName(), &isA<GrxArea>},         {GrxEdge::getElementName(), &isA<GrxEdge>},
+        {GrxInterval::getElementName(), &isA<GrxInterval>}, {GrxLabeling::getElementName(), &noElement},
+        {GrxLine::getElementName(), &isA<GrxLine>},         {GrxPath::getElementName(), &isA<GrxPath>},
+        {GrxPoint::getElementName(), &isA<GrxPoint>},       {GrxPolygon::getElementName(), &isA<GrxPolygon>},
+        {GrxSchema::getElementName(), &isA<GrxSchema>},
+    };
+    const ChartString word = attributeOf(instruction, GrxUni::_elementType);
+    for (const auto& kind : kinds)
+        if (word.equals(kind.word)) {
+            accepts_ = kind.accepts;
+            labelings_ = kind.accepts == &noElement;
+        }
+}
+
 const DOMElement* sourceObject(const GrxVisualization* source, const XMLCh* id) {
     if (source == nullptr || !hasText(id))
         return nullptr;
@@ -218,13 +247,16 @@ bool sourceSetsCycle(const GrxVisualization* source, const CTAesthetic& aestheti
     return own != nullptr && hasText(own->getAttribute(GrxUni::_cycle));
 }
 
+void fillCycle(BaseTemplate& action, GrxCycle& styles, const DOMElement& cycle) {
+    for (const DOMElement* style : childrenNamed(&cycle, GrxUni::_style))
+        action.importStyle(style, styles.addStyle());
+}
+
 void giveNewCycle(BaseTemplate& action, GrxVisualization& target, CTAesthetic& aesthetic,
                   const DOMElement& cycle) {
     GrxStyleCycle& styleCycle = target.addStyleCycle(action.CreateUniqueId(ChartString(GrxUni::_styleCycle)));
     aesthetic.setCycle(styleCycle);
-    GrxCycle& styles = styleCycle.addCycle();
-    for (const DOMElement* style : childrenNamed(&cycle, GrxUni::_style))
-        action.importStyle(style, styles.addStyle());
+    fillCycle(action, styleCycle.addCycle(), cycle);
 }
 
 void replaceCycle(BaseTemplate& action, GrxVisualization& target, CTAesthetic& aesthetic,

@@ -120,6 +120,18 @@ const DOMElement* firstDescendantNamed(const DOMElement* element, const XMLCh* n
 // The element's own text: its direct text children joined, nested elements' text left out.
 ChartString directText(const DOMElement* element);
 
+// The elements an instruction's "elementType" names (absent or unknown: every element). Labelings
+// are aesthetics, never elements: naming them takes no element.
+struct ElementKind {
+    explicit ElementKind(const DOMElement* instruction);
+    bool takes(const CTElementType& element) const { return accepts_ == nullptr || accepts_(element); }
+    bool labelings() const { return labelings_; }
+
+private:
+    bool (*accepts_)(const CTElementType&) = nullptr;
+    bool labelings_ = false;
+};
+
 // What a cycle instruction says: which aesthetics (0: all, n: the n-th of each element) and the
 // styles of their new cycle (the last "cycle" child; none changes no cycle).
 struct CycleInstruction {
@@ -150,6 +162,8 @@ GrxStyle& styleOf(BaseTemplate& action, Owner& owner, GrxStyle* (Owner::*get)() 
     return made;
 }
 
+// One style in `styles` per "style" child of `cycle` (a "cycle" element of the instruction), in order.
+void fillCycle(BaseTemplate& action, GrxCycle& styles, const DOMElement& cycle);
 // A new style cycle for an aesthetic, under a fresh id, holding the template's styles of `cycle`
 // (a "cycle" element of the instruction) as one cycle.
 void giveNewCycle(BaseTemplate& action, GrxVisualization& target, CTAesthetic& aesthetic,

@@ -37,6 +37,17 @@ GrxStyle& ownStyle(BaseTemplate& action, Owner& owner, GrxStyle* (Owner::*get)()
     return styleOf(action, owner, get, set, ChartString());
 }
 
+ChartString trimmed(const ChartString& text) {
+    const std::u16string& all = text.str();
+    const auto blank = [](char16_t c) { return c == u' ' || c == u'\t' || c == u'\n' || c == u'\r'; };
+    std::size_t begin = 0, end = all.size();
+    while (begin < end && blank(all[begin]))
+        ++begin;
+    while (end > begin && blank(all[end - 1]))
+        --end;
+    return ChartString(all.substr(begin, end - begin));
+}
+
 } // namespace
 
 void BaseTemplate::setMajorTicks(GrxAxis& axis, const DOMElement* element) {
@@ -194,7 +205,8 @@ void BaseTemplate::styleLabel(GrxLabel& label, const DOMElement* element) {
 void BaseTemplate::mergeText(const DOMElement* element, GrxLabel& label) {
     if (element == nullptr)
         return;
-    ChartString text = directText(element);
+    // The indentation around a title's text in a printed template is layout, not text.
+    ChartString text = trimmed(directText(element));
     localiseChartText(text);
     if (text.empty())
         return;

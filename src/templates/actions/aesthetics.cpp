@@ -181,45 +181,10 @@ bool TSetPattern::apply() {
 
 // ---- setSize --------------------------------------------------------------------------------------
 
-namespace {
-
-template <class T> bool isA(const CTElementType& element) {
-    return dynamic_cast<const T*>(&element) != nullptr;
-}
-// Labelings are aesthetics, never among a graph's elements.
-bool none(const CTElementType&) {
-    return false;
-}
-
-} // namespace
-
-TSetSize::Kind TSetSize::readKind() const {
-    static const struct {
-        const XMLCh* word;
-        Kind kind;
-    } kinds[] = {
-        {GrxUni::_element, nullptr},
-        {GrxArea::getElementName(), &isA<GrxArea>},
-        {GrxEdge::getElementName(), &isA<GrxEdge>},
-        {GrxInterval::getElementName(), &isA<GrxInterval>},
-        {GrxLabeling::getElementName(), &none},
-        {GrxLine::getElementName(), &isA<GrxLine>},
-        {GrxPath::getElementName(), &isA<GrxPath>},
-        {GrxPoint::getElementName(), &isA<GrxPoint>},
-        {GrxPolygon::getElementName(), &isA<GrxPolygon>},
-        {GrxSchema::getElementName(), &isA<GrxSchema>},
-    };
-    const ChartString word = attributeOf(instruction_, GrxUni::_elementType);
-    for (const auto& k : kinds)
-        if (word.equals(k.word))
-            return k.kind;
-    return nullptr;
-}
-
 bool TSetSize::apply() {
     forEachGraphElements(target_, [&](const std::vector<CTElementType*>& elements) {
         for (CTElementType* element : elements) {
-            if (kind_ != nullptr && !kind_(*element))
+            if (!kind_.takes(*element))
                 continue;
             const std::vector<GrxSize*> sizes = element->getSizes();
             for (std::size_t p = 1; p <= sizes.size(); ++p) {

@@ -53,15 +53,12 @@ public:
     using BaseTemplate::BaseTemplate;
     bool apply() override;
 
-    using Kind = bool (*)(const CTElementType&);
-
 private:
     const CycleInstruction cycle_{instruction_};
     // The "parameter" children: the size's length mappings, when there are any.
     const std::vector<const XERCES_CPP_NAMESPACE::DOMElement*> mappings_ =
         childrenNamed(instruction_, GrxUni::_parameter);
-    const Kind kind_ = readKind(); // null: every element
-    Kind readKind() const;
+    const ElementKind kind_{instruction_};
 };
 
 // Colours become dashes or images.
