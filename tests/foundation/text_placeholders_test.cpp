@@ -1,7 +1,6 @@
 #include "foundation/FoundationSupport.h"
 #include "foundation/TextPlaceholders.h"
 
-#include <plotaid/ChartBase.h>
 #include <plotaid/ChartTranscoder.h>
 
 #include <msgbook/FacSTDictionary.h>
@@ -87,13 +86,6 @@ TEST(TextPlaceholders, FilledAtFixedMoments) {
         plotaid::detail::updateTextAt(text, c.dictionary, c.encoding, c.now);
         EXPECT_EQ(text.str(), c.filled);
     }
-}
-
-TEST(TextPlaceholders, UpdateTextReadsTheClock) {
-    ChartString text("@@current_YYYY@@ @@current_min@@");
-    ChartBase::updateText(text, nullptr, "CP1252");
-    EXPECT_FALSE(text.ContainsString(ChartString("@@")));
-    EXPECT_EQ(text.length(), 7u);
 }
 
 TEST(ChartTranscoderTest, RoundTripsAndFailsSafely) {
