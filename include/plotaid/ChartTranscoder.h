@@ -27,7 +27,7 @@ public:
 
     // Empty (reported) when the text is not valid in the code page or the transcoder is not valid.
     ChartString transcode(const std::string& text) const;
-    // Empty (reported) for null, or for text the code page cannot hold.
+    // Empty for null, and (reported) for text the code page cannot hold.
     std::string transcodeTo(const char16_t* text) const;
 
 private:

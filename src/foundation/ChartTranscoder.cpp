@@ -33,7 +33,7 @@ ChartString ChartTranscoder::transcode(const std::string& text) const {
 
 std::string ChartTranscoder::transcodeTo(const char16_t* text) const {
     std::string out;
-    if (text != nullptr && *text == 0)
+    if (text == nullptr || *text == 0)
         return out;
     if (!osport::KovarMBU16ToGeneric(converter_, text, out)) {
         reportFailure("text cannot be written in " + encoding_, kFile, __LINE__);

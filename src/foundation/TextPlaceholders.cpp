@@ -20,7 +20,8 @@ namespace {
 
 const char* const kMonths[] = {"January", "February", "March",     "April",   "May",      "June",
                                "July",    "August",   "September", "October", "November", "December"};
-const char* const kWeekdays[] = {"Sunday", "Monday", "Tuesday", "Wednesday", "Thursday", "Friday", "Saturday"};
+const char* const kWeekdays[] = {"Sunday",   "Monday", "Tuesday", "Wednesday",
+                                 "Thursday", "Friday", "Saturday"};
 
 ChartString twoDigits(int value) {
     char buffer[16];
@@ -88,7 +89,8 @@ void updateTextAt(ChartString& text, const msgbook::FacSTDictionary* dictionary,
         replace(text, ")DATE", ChartString(buffer));
     }
     if (holds(text, "@@current_time@@")) {
-        std::snprintf(buffer, sizeof buffer, "%02d:%02d:%02d", twelveHour(now.tm_hour), now.tm_min, now.tm_sec);
+        std::snprintf(buffer, sizeof buffer, "%02d:%02d:%02d", twelveHour(now.tm_hour), now.tm_min,
+                      now.tm_sec);
         replace(text, "@@current_time@@", ChartString(buffer));
     }
     if (holds(text, ")TIME") && words.lookUp(ampmKey, word)) {

@@ -33,8 +33,8 @@ const scratchloc::PathFinder* resourcePaths() {
 
 std::string codePageOf(const std::string& languageCode) {
     static const std::pair<const char*, const char*> kCodePages[] = {
-        {"ru", "CP1251"},    {"pl", "CP1250"}, {"zh_tw", "CP950"}, {"zh-cn", "CP936"},
-        {"ko", "CP949"},     {"ja", "CP932"},
+        {"ru", "CP1251"},   {"pl", "CP1250"}, {"zh_tw", "CP950"},
+        {"zh-cn", "CP936"}, {"ko", "CP949"},  {"ja", "CP932"},
     };
     for (const auto& [code, page] : kCodePages) {
         if (languageCode == code)

@@ -1,7 +1,6 @@
 #include "foundation/FoundationSupport.h"
 #include "foundation/TextPlaceholders.h"
 
-#include <plotaid/ChartBase.h>
 #include <plotaid/ChartTranscoder.h>
 
 #include <msgbook/FacSTDictionary.h>
@@ -66,19 +65,23 @@ TEST(TextPlaceholders, FilledAtFixedMoments) {
         {&en, "CP1252", midnight, "@@current_hour@@ @@current_time@@ )TIME", u"12 12:30:00 0:30:00 a.m."},
         {&en, "CP1252", midnight, "@@current_hour24@@", u"00"},
         {&en, "CP1252", midnight, "@@current_hour24@@ @@current_hour@@", u"00 @@current_hour@@"},
-        {&en, "CP1252", lastSecond, "@@current_YY@@ )TIME @@current_ampm@@ @@current_hour@@ @@current_weekday@@",
+        {&en, "CP1252", lastSecond,
+         "@@current_YY@@ )TIME @@current_ampm@@ @@current_hour@@ @@current_weekday@@",
          u"99 23:59:59 p.m. p.m. 11 Friday"},
         {&de, "CP1252", lastSecond, "@@current_monthname@@ @@current_weekday@@ @@current_ampm@@",
          u"Dezember Freitag nachm."},
         {&en, "CP1252", early, "@@current_YY@@ @@current_time@@ @@current_ampm@@", u"05 12:00:00 p.m."},
         {&en, "CP1252", morning, "@@current_day@@-@@current_day@@ )DATE)DATE", u"04-04 2026/03/042026/03/04"},
-        {&en, "CP1252", morning, "plain @@ text )date @@current_Day@@", u"plain @@ text )date @@current_Day@@"},
+        {&en, "CP1252", morning, "plain @@ text )date @@current_Day@@",
+         u"plain @@ text )date @@current_Day@@"},
         // No word to put in leaves just that placeholder.
-        {nullptr, "CP1252", morning, "@@current_monthname@@ )TIME @@current_ampm@@ @@current_weekday@@ @@current_day@@",
+        {nullptr, "CP1252", morning,
+         "@@current_monthname@@ )TIME @@current_ampm@@ @@current_weekday@@ @@current_day@@",
          u"@@current_monthname@@ )TIME @@current_ampm@@ @@current_weekday@@ 04"},
         {&partial, "CP1252", morning, ")TIME @@current_monthname@@", u"9:05:07 AM @@current_monthname@@"},
         {&notALanguageFolder, "CP1252", morning, "@@current_ampm@@", u"@@current_ampm@@"},
-        {&de, "NO-SUCH-CODE-PAGE", morning, "@@current_monthname@@ @@current_sec@@", u"@@current_monthname@@ 07"},
+        {&de, "NO-SUCH-CODE-PAGE", morning, "@@current_monthname@@ @@current_sec@@",
+         u"@@current_monthname@@ 07"},
         {&de, "UTF-8", morning, "@@current_monthname@@", u"@@current_monthname@@"}, // Latin-1 byte
     };
     for (const auto& c : cases) {
@@ -87,13 +90,6 @@ TEST(TextPlaceholders, FilledAtFixedMoments) {
         plotaid::detail::updateTextAt(text, c.dictionary, c.encoding, c.now);
         EXPECT_EQ(text.str(), c.filled);
     }
-}
-
-TEST(TextPlaceholders, UpdateTextReadsTheClock) {
-    ChartString text("@@current_YYYY@@ @@current_min@@");
-    ChartBase::updateText(text, nullptr, "CP1252");
-    EXPECT_FALSE(text.ContainsString(ChartString("@@")));
-    EXPECT_EQ(text.length(), 7u);
 }
 
 TEST(ChartTranscoderTest, RoundTripsAndFailsSafely) {

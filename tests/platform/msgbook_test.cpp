@@ -83,9 +83,8 @@ TEST_F(Messages, NamesThatCouldLeaveTheFolderReadNothing) {
 TEST_F(Messages, OverALanguageFolderOfTheMessagesFolder) {
     write("GRAPH.de.txt", "k\tde word\n");
     const std::pair<std::string, const char*> cases[] = {
-        {folder + "messages/de/", "de word"}, {folder + "messages/de", "de word"},
-        {folder + "de/", "k"},                {folder + "messages/../de/", "k"},
-        {folder + "messages/", "k"},          {"de", "k"},
+        {folder + "messages/de/", "de word"}, {folder + "messages/de", "de word"}, {folder + "de/", "k"},
+        {folder + "messages/../de/", "k"},    {folder + "messages/", "k"},         {"de", "k"},
     };
     for (const auto& [path, word] : cases) {
         msgbook::FacSTDictionary d = msgbook::FacSTDictionary::overLanguageFolder(path);

@@ -49,8 +49,9 @@ TEST(ScratchlocPathFactory, LanguageFolderFollowsTheHostLanguage) {
     ScopedEnv variable("PLOTAID_RESOURCE_DIR", "/opt/res");
     const scratchloc::PathFinder& finder = *PathFactory::getPathInstance(PathFactory::ResourceFolder);
     const std::string before = msgbook::hostLanguage();
-    const std::pair<const char*, const char*> cases[] = {
-        {"de", "/opt/res/messages/de/"}, {"zh_tw", "/opt/res/messages/zh_tw/"}, {"../x", "/opt/res/messages/"}};
+    const std::pair<const char*, const char*> cases[] = {{"de", "/opt/res/messages/de/"},
+                                                         {"zh_tw", "/opt/res/messages/zh_tw/"},
+                                                         {"../x", "/opt/res/messages/"}};
     for (const auto& [language, full] : cases) {
         msgbook::setHostLanguage(language);
         EXPECT_EQ(finder.getFullPath(), full) << language;

@@ -17,12 +17,9 @@ TEST(Localise, LanguageCodeAndCodePage) {
         const char* base;
         const char* code;
     } cases[] = {
-        {"/r/messages/ja/", "/r/messages/", "ja"},
-        {"/r/messages/zh_tw", "/r/messages/", "zh_tw"},
-        {"/r/messages/de/x/", "/r/messages", "de"},
-        {"/r/messages/", "/r/messages/", ""},
-        {"/r/other/de/", "/r/messages/", ""},
-        {"/r/", "/r/messages/", ""},
+        {"/r/messages/ja/", "/r/messages/", "ja"},  {"/r/messages/zh_tw", "/r/messages/", "zh_tw"},
+        {"/r/messages/de/x/", "/r/messages", "de"}, {"/r/messages/", "/r/messages/", ""},
+        {"/r/other/de/", "/r/messages/", ""},       {"/r/", "/r/messages/", ""},
     };
     for (const auto& c : cases)
         EXPECT_EQ(languageCodeOf(c.full, c.base), c.code) << c.full << " after " << c.base;

@@ -36,7 +36,9 @@ bool parseMoment(const std::string& text, std::tm& moment) {
         if (kPattern[i] == 'd' ? !digit : text[i] != kPattern[i])
             return false;
     }
-    const auto number = [&](std::size_t at, std::size_t digits) { return std::stoi(text.substr(at, digits)); };
+    const auto number = [&](std::size_t at, std::size_t digits) {
+        return std::stoi(text.substr(at, digits));
+    };
     std::tm t{};
     t.tm_year = number(0, 4) - 1900;
     t.tm_mon = number(5, 2) - 1;

@@ -54,7 +54,8 @@ FacSTDictionary FacSTDictionary::overLanguageFolder(const std::string& path) {
     std::string language = folder.substr(slash + 1);
     folder.erase(slash + 1);
     const std::string messages(kMessages);
-    if (folder.size() < messages.size() || folder.compare(folder.size() - messages.size(), messages.size(), messages) != 0)
+    if (folder.size() < messages.size() ||
+        folder.compare(folder.size() - messages.size(), messages.size(), messages) != 0)
         return FacSTDictionary(std::string(), std::string());
     folder.erase(folder.size() - messages.size() + 1);
     return FacSTDictionary(std::move(folder), std::move(language));
