@@ -106,7 +106,11 @@ void TStyleCycle::fillFromInstruction(GrxStyleCycle& cycle) {
 }
 
 GrxStyleCycle& TStyleCycle::cycleOf(CTAesthetic& aesthetic) {
-    if (GrxStyleCycle* existing = aesthetic.getCycle())
+    // A style-by that hands out the repository itself gets a cycle of its own: rebuilding the
+    // repository in its place would lose the cycles every other aesthetic takes from it.
+    const GrxExtensionVis* extension = target_.getExtension();
+    GrxStyleCycle* existing = aesthetic.getCycle();
+    if (existing != nullptr && (extension == nullptr || existing != extension->getStyleCycleRepository()))
         return *existing;
     GrxStyleCycle& made = target_.addStyleCycle(CreateUniqueId(ChartString(GrxUni::_styleCycle)));
     aesthetic.setCycle(made);

@@ -41,7 +41,7 @@ TEST_F(Axes, ScaleMethodsSafeExponentAndBaseSkippingCategoricalAndPolarRoles) {
          "invert=true;method=linear;origin=0;"},
         {"scatter.xml", "<setAxisScale role=\"y\" method=\"probit\"/>", "dim_x", "<none>"},
         {"simple-bar.xml", "<setAxisScale role=\"x\" method=\"log\"/>", "dim_x", "<none>"},
-        {"pie.xml", "<setAxisScale role=\"y\" method=\"log\"/>", "dim_y", "<none>"},
+        {"pie.xml", "<setAxisScale role=\"x\" method=\"log\"/>", "dim_y", "<none>"}, // polar
     };
     for (const Row& row : rows) {
         GrxVisualization& chart = sample(row.chart);
@@ -144,7 +144,7 @@ TEST_F(Axes, StylesTitlesAndTheScatterplotMatrix) {
     GrxVisualization& chart = sample("scatter.xml");
     GrxAxis& y = *byId<GrxAxis>(chart, "dim_y_axis");
     y.getLabel()->removeTextFrameStyle();
-    act<TSetAxisStyle>("<setAxisStyle role=\"y\"><style color=\"red\"/><label>Pay</label><axisLabelStyle>"
+    act<TSetAxisStyle>("<setAxisStyle role=\"y\"><style color=\"red\"/><label>\n  Pay\n</label><axisLabelStyle>"
                        "<style number=\"1\" color=\"blue\"/><style number=\"2\" font-size=\"20pt\"/></axisLabelStyle>"
                        "</setAxisStyle>",
                        chart);

@@ -162,8 +162,9 @@ TEST_F(Conversion, EarlierFormExamplesDoWhatTheirTwinsDo) {
         // Style and axis instructions take effect; frames, lines and bins wait for their actions.
         const std::string kind(name);
         EXPECT_EQ(changed > 0, kind == "styles" || kind == "axes") << name;
-        if (kind == "styles")
+        if (kind == "styles") {
             EXPECT_EQ(changed, grammar_test::sampleCharts().size());
+        }
     }
 }
 

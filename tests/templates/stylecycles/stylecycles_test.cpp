@@ -10,6 +10,7 @@ namespace {
 
 const std::string kRepository =
     "<setStyleCycle id=\"styleCycleRepository\"{create}><cycle><style color=\"red\"/><style color=\"blue\"/></cycle>"
+    "<cycle><style color=\"gray\"/></cycle>"
     "<cycle><style value=\"fill-pattern:3\"/><style value=\"fill-pattern:5\"/></cycle>"
     "<cycle><style stroke-dasharray=\"none\"/><style stroke-dasharray=\"2 2\"/></cycle>"
     "<cycle><style value=\"symbol:square\"/></cycle></setStyleCycle>";
@@ -44,6 +45,8 @@ TEST_F(StyleCycles, TheStyleByNumberCountsOverTheGraphAndTheLockedCycleStays) {
     GrxStyleBy& third = byId<GrrUviza>(chart, "frame_graph_1")->addLine().addStyleBy();
     third.setId(ChartString("styleBy_third"));
     const std::string color = stylesOf(chart, "styleBy_color"), dash = stylesOf(chart, "styleBy_dash");
+    const GrxStyleCycle& repository = *chart.getExtension()->getStyleCycleRepository(); // styleBy_color's
+    const std::string kept = describeStyles(repository.getImplementation());
     EXPECT_TRUE(act<TStyleCycle>("<setStyleCycle styleByNumber=\"3\"><cycle><style color=\"red\"/></cycle></setStyleCycle>", chart));
     EXPECT_EQ(stylesOf(chart, "styleBy_third"), "[({color=red;})]");
     EXPECT_EQ(stylesOf(chart, "styleBy_color") + stylesOf(chart, "styleBy_dash"), color + dash);
@@ -56,6 +59,8 @@ TEST_F(StyleCycles, TheStyleByNumberCountsOverTheGraphAndTheLockedCycleStays) {
     // No cycle in the instruction still leaves every cycle with a style.
     act<TStyleCycle>("<setStyleCycle styleByNumber=\"1\"/>", chart);
     EXPECT_EQ(stylesOf(chart, "styleBy_color"), "[({})]");
+    // The repository is never rebuilt in a style-by's place.
+    EXPECT_EQ(describeStyles(repository.getImplementation()), kept);
 }
 
 TEST_F(StyleCycles, APatternCycleFromTheInstructionPaintsBlackOnWhite) {
@@ -74,10 +79,10 @@ TEST_F(StyleCycles, TheRepositoryHandsOutCyclesByElementKind) {
         {"line-series.xml", "line_1", "PatternsOnly", "", "[({stroke-dasharray=none;}{stroke-dasharray=2 2;})]"},
         {"simple-bar.xml", "interval_1", "PatternsOnly", "", "[({pattern=3;}{pattern=5;})]"},
         {"scatter.xml", "point_1", "PatternsOnly", "", "[({symbol=square;})]"},
-        {"line-series.xml", "line_1", "ColorsOnly", "", "[({color=red;}{color=blue;})]"},
+        {"line-series.xml", "line_1", "ColorsOnly", "", "[({color=gray;})]"}, // the last colour cycle counts
         // Points take colours as outlines, unless their cycle is the one kept filled.
-        {"scatter.xml", "point_1", "ColorsOnly", "", "[({color=transparent;color2=red;}{color=transparent;color2=blue;})]"},
-        {"scatter.xml", "point_1", "ColorsOnly", "styleCycleColor", "[({color=red;}{color=blue;})]"},
+        {"scatter.xml", "point_1", "ColorsOnly", "", "[({color=transparent;color2=gray;})]"},
+        {"scatter.xml", "point_1", "ColorsOnly", "styleCycleColor", "[({color=gray;})]"},
         // Without a creation type only a bar with several style-bys is restyled.
         {"scatter.xml", "point_1", "", "", "[({color=black;})]"},
     };
@@ -92,7 +97,7 @@ TEST_F(StyleCycles, TheRepositoryHandsOutCyclesByElementKind) {
         EXPECT_EQ(stylesOf(chart, "styleBy_new"), row.expected);
         // The repository holds the instruction's cycles; copies never change it.
         EXPECT_EQ(describeStyles(chart.getExtension()->getStyleCycleRepository()->getImplementation()),
-                  "[({color=red;}{color=blue;})({pattern=3;}{pattern=5;})({stroke-dasharray=none;}"
+                  "[({color=red;}{color=blue;})({color=gray;})({pattern=3;}{pattern=5;})({stroke-dasharray=none;}"
                   "{stroke-dasharray=2 2;})({symbol=square;})]");
         expectSound(chart);
     }
@@ -101,7 +106,7 @@ TEST_F(StyleCycles, TheRepositoryHandsOutCyclesByElementKind) {
     styleBy(bars, "interval_1", "pattern_by");
     act<TStyleCycle>(repository(""), bars);
     EXPECT_EQ(stylesOf(bars, "color_by") + stylesOf(bars, "pattern_by"),
-              "[({color=red;}{color=blue;})][({pattern=3;}{pattern=5;})]");
+              "[({color=gray;})][({pattern=3;}{pattern=5;})]");
 }
 
 TEST_F(StyleCycles, LabelingsOnlyWhenTheyAreNamed) {
@@ -117,6 +122,10 @@ TEST_F(StyleCycles, LabelingsOnlyWhenTheyAreNamed) {
 
 TEST_F(StyleCycles, AddedStyleBysTakeTheFirstAestheticVariable) {
     GrxVisualization& chart = sample("simple-bar.xml");
+    byId<CTAesthetic>(chart, "color_1")->removeVariable(); // the first aesthetic must have a variable
+    act<TAddStyleCycle>("<addStyleCycle elementName=\"y\"><cycle/></addStyleCycle>", chart);
+    EXPECT_EQ(byId<CTElementType>(chart, "interval_1")->getY()->first<GrxStyleBy>(), nullptr);
+    byId<CTAesthetic>(chart, "color_1")->setVariable(*byId<CTVariableType>(chart, "var_jobcat"));
     const std::string before = canonical(chart);
     for (const char* refused : {"<addStyleCycle elementName=\"color\"/>",
                                 "<addStyleCycle><cycle><style color=\"red\"/></cycle></addStyleCycle>"})
