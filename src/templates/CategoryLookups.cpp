@@ -21,28 +21,6 @@ bool categorical(const CTVariableType* variable) {
     return variable != nullptr && variable->getCategorical() == 1;
 }
 
-template <class A> void appendAll(std::vector<CTAesthetic*>& out, const std::vector<A*>& list) {
-    out.insert(out.end(), list.begin(), list.end());
-}
-
-// The aesthetics that may carry a legend's domain: labelings count, visibilities do not.
-std::vector<CTAesthetic*> legendDomainAesthetics(const CTElementType& element) {
-    std::vector<CTAesthetic*> out;
-    appendAll(out, element.getStyleBys());
-    appendAll(out, element.getDashs());
-    appendAll(out, element.getShapes());
-    appendAll(out, element.getSizes());
-    appendAll(out, element.getRotations());
-    appendAll(out, element.getColors());
-    appendAll(out, element.getOffsets());
-    appendAll(out, element.getPatterns());
-    appendAll(out, element.getTransparencys());
-    appendAll(out, element.getLabelings());
-    appendAll(out, element.getSplits());
-    appendAll(out, element.getColorComponents());
-    return out;
-}
-
 GrxCategoricalDomain* domainOf(const CTCoordinate* coordinate) {
     const CTVariableType* variable = coordinate ? coordinate->getVariable() : nullptr;
     return variable ? variable->getCategoricalDomain() : nullptr;
@@ -81,7 +59,7 @@ GrxCategoricalDomain* BaseTemplate::getCategoricalDomain(const GrrUviza& graph, 
         else if (role.equals(GrxUni::_z))
             found = domainOf(element->getZ());
         else if (role.equals(GrxUni::_legend))
-            for (const CTAesthetic* aesthetic : legendDomainAesthetics(*element))
+            for (const CTAesthetic* aesthetic : aestheticsOf(*element, AestheticList::LegendDomains))
                 if ((found = domainOf(*aesthetic)) != nullptr)
                     break;
         if (found != nullptr)

@@ -68,7 +68,7 @@ std::vector<CTElementType*> elementsOf(const GrrUviza& graph) {
     return elements;
 }
 
-std::vector<CTAesthetic*> aestheticsOf(const CTElementType& element) {
+std::vector<CTAesthetic*> aestheticsOf(const CTElementType& element, AestheticList list) {
     std::vector<CTAesthetic*> out;
     appendAll(out, element.getStyleBys());
     appendAll(out, element.getDashs());
@@ -79,9 +79,12 @@ std::vector<CTAesthetic*> aestheticsOf(const CTElementType& element) {
     appendAll(out, element.getOffsets());
     appendAll(out, element.getPatterns());
     appendAll(out, element.getTransparencys());
+    if (list == AestheticList::LegendDomains)
+        appendAll(out, element.getLabelings());
     appendAll(out, element.getSplits());
     appendAll(out, element.getColorComponents());
-    appendAll(out, element.getVisibilitys());
+    if (list == AestheticList::Selectable)
+        appendAll(out, element.getVisibilitys());
     return out;
 }
 
@@ -245,6 +248,18 @@ const DOMElement* sourceObject(const GrxVisualization* source, const XMLCh* id) 
 bool sourceSetsCycle(const GrxVisualization* source, const CTAesthetic& aesthetic) {
     const DOMElement* own = sourceObject(source, aesthetic.getId());
     return own != nullptr && hasText(own->getAttribute(GrxUni::_cycle));
+}
+
+GrxStyle& textFrameStyleOf(BaseTemplate& action, GrxLabel& label) {
+    CTLabelType& owner = label;
+    const bool made = owner.getTextFrameStyle() == nullptr;
+    GrxStyle& frame = styleOf(action, owner, &CTLabelType::getTextFrameStyle, &CTLabelType::setTextFrameStyle, {});
+    if (made) {
+        frame.setColor(GrxStyle::_transparent);
+        frame.setColor2(GrxStyle::_transparent);
+        frame.setVisible(false);
+    }
+    return frame;
 }
 
 void fillCycle(BaseTemplate& action, GrxCycle& styles, const DOMElement& cycle) {

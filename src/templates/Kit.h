@@ -46,8 +46,10 @@ template <class Visit> void forEachGraphElements(const GrxVisualization& target,
 }
 
 // Style-bys, dashes, shapes, sizes, rotations, colours, offsets, patterns, transparencies, splits,
-// colour components, visibilities: kind by kind.
-std::vector<CTAesthetic*> aestheticsOf(const CTElementType& element);
+// colour components, visibilities: kind by kind. Those that may carry a legend's domain take
+// labelings (before splits) instead of visibilities.
+enum class AestheticList { Selectable, LegendDomains };
+std::vector<CTAesthetic*> aestheticsOf(const CTElementType& element, AestheticList list = AestheticList::Selectable);
 
 // ---- selection --------------------------------------------------------------------------------------
 
@@ -161,6 +163,10 @@ GrxStyle& styleOf(BaseTemplate& action, Owner& owner, GrxStyle* (Owner::*get)() 
     (owner.*set)(made);
     return made;
 }
+
+// The label's text frame style; one made here is transparent in both colours and hidden, so a
+// title gains no box it did not have.
+GrxStyle& textFrameStyleOf(BaseTemplate& action, GrxLabel& label);
 
 // One style in `styles` per "style" child of `cycle` (a "cycle" element of the instruction), in order.
 void fillCycle(BaseTemplate& action, GrxCycle& styles, const DOMElement& cycle);

@@ -192,12 +192,7 @@ void BaseTemplate::styleLabel(GrxLabel& label, const DOMElement* element) {
     GrxStyle& style = ownStyle(*this, owner, &CTLabelType::getStyle, &CTLabelType::setStyle, made);
     if (made)
         style.setColor(GrxStyle::_black);
-    GrxStyle& frame = ownStyle(*this, owner, &CTLabelType::getTextFrameStyle, &CTLabelType::setTextFrameStyle, made);
-    if (made) {
-        frame.setColor(GrxStyle::_transparent);
-        frame.setColor2(GrxStyle::_transparent);
-        frame.setVisible(false);
-    }
+    GrxStyle& frame = textFrameStyleOf(*this, label);
     for (const DOMElement* declared : descendantsNamed(element, GrxUni::_style))
         importStyle(declared, unsignedAttribute(declared, GrxUni::_number) == 1 ? frame : style);
 }

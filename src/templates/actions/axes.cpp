@@ -48,6 +48,15 @@ bool looksLikeDateTime(const ChartString& text) {
     return text.length() == 23 && text.ContainsString(u"-");
 }
 
+// The axis title from an instruction's label element: its text and its styles.
+void retitle(BaseTemplate& action, GrxAxis& axis, const DOMElement* label) {
+    if (label == nullptr)
+        return;
+    GrxLabel& title = axis.getLabel() ? *axis.getLabel() : axis.addLabel();
+    action.mergeText(label, title);
+    action.styleLabel(title, label);
+}
+
 } // namespace
 
 // ---- setAxisScale ------------------------------------------------------------------------------------
@@ -200,22 +209,11 @@ bool TSetAxisStyle::apply() {
                 if (style_ != nullptr)
                     importStyle(style_, styleOf(*this, *axis, &GrxAxis::getStyle, &GrxAxis::setStyle,
                                                 CreateUniqueId(ChartString(GrxUni::_style))));
-                if (label_ != nullptr) {
-                    GrxLabel& label = axis->getLabel() ? *axis->getLabel() : axis->addLabel();
-                    mergeText(label_, label);
-                    styleLabel(label, label_);
-                }
+                retitle(*this, *axis, label_);
                 if (GrxLabel* label = axis->getLabel()) {
                     CTLabelType& owner = *label;
                     GrxStyle& text = styleOf(*this, owner, &CTLabelType::getStyle, &CTLabelType::setStyle, {});
-                    const bool framed = owner.getTextFrameStyle() != nullptr;
-                    GrxStyle& frame = styleOf(*this, owner, &CTLabelType::getTextFrameStyle,
-                                              &CTLabelType::setTextFrameStyle, {});
-                    if (!framed) {
-                        frame.setColor(GrxStyle::_transparent);
-                        frame.setColor2(GrxStyle::_transparent);
-                        frame.setVisible(false);
-                    }
+                    GrxStyle& frame = textFrameStyleOf(*this, *label);
                     if (labelStyle_ != nullptr)
                         importStyle(labelStyle_, text);
                     if (labelFrameStyle_ != nullptr)
@@ -363,11 +361,7 @@ void TAddDerivedAxis::styleDerivedAxes(GrxDimension& dimension) {
     for (GrxAxis* axis : dimension.getAxiss()) {
         if (!isAxisDerived(*axis))
             continue;
-        if (label_ != nullptr) {
-            GrxLabel& label = axis->getLabel() ? *axis->getLabel() : axis->addLabel();
-            mergeText(label_, label);
-            styleLabel(label, label_);
-        }
+        retitle(*this, *axis, label_);
         setMajorTicks(*axis, majorTicks_);
         setMinorTicks(*axis, minorTicks_);
         GrxStyle& style = styleOf(*this, *axis, &GrxAxis::getStyle, &GrxAxis::setStyle, {});
