@@ -47,6 +47,10 @@ TEST_F(Packer, LaysOutTheFixedPattern) {
         {"", R"(<extension id="e" title2="t2" subtitle="s"/><graph id="g"/><labelFrame id="s"/>)"
              R"(<labelFrame id="t2"><location part="top" method="fixed" value="7%"/></labelFrame>)",
          "t2", "t2 s", "top:fixed:7%;|top:nextTo:t2;height:content:-;"},
+        // A graph whose attachments the user made stays.
+        {"", R"(<extension id="e"/><graph id="g"><location part="left" method="fixed" value="3%"/>)"
+             R"(<location part="top" method="nextTo" target="e" specifiedByUser="true"/></graph>)",
+         "g", "g", "left:fixed:3%;top:nextTo:e;"},
         {"", R"(<extension id="e" preserveLocations="true"/><graph id="g"><location part="left" value="3%"/></graph>)",
          "", "g", "left:-:3%;"},
     };

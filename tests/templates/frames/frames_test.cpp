@@ -49,6 +49,8 @@ TEST_F(Frames, AddFramePlacesSnapsAndStyles) {
          true, "t", "top:fixed:2%;bottom:fixed:20%;"},
         {"histogram.xml", "", "", "<addFrame type=\"statisticsSummary\" count=\"1\">{place}</addFrame>", true,
          "frame_statistics_summary_1", "left:fixed:5%;right:fixed:95%;top:fixed:3%;bottom:fixed:9%;"},
+        {"histogram.xml", "", "", "<addFrame type=\"statisticsSummary\" count=\"1\" styleOnly=\"true\">{place}</addFrame>",
+         true, "frame_statistics_summary_1", "right:fixed:99%;top:fixed:15%;width:content:-;height:content:-;"},
         // Graphs: only the edges given are replaced, never with styleOnly; counts beyond the graphs fail.
         {"histogram.xml", "", "", R"(<addFrame type="graph" count="1"><location left="5%" top="6%"/></addFrame>)",
          true, "frame_graph_1", "right:fixed:80%;bottom:fixed:85%;left:fixed:5%;top:fixed:6%;"},
@@ -64,6 +66,7 @@ TEST_F(Frames, AddFramePlacesSnapsAndStyles) {
          true, "frame_graph_1", "left:fixed:12%;right:fixed:99%;top:fixed:12%;bottom:fixed:85%;"},
         // Free texts: without a label exactly one free frame is needed; with one a new text is made.
         {"", "", R"(<labelFrame id="a"/><labelFrame id="b"/>)", "<addFrame type=\"labelFrame\"/>", false, "", ""},
+        {"", "", "", "<addFrame type=\"labelFrame\"/>", false, "", ""},
         {"", "", R"(<labelFrame id="a"/>)", "<addFrame type=\"labelFrame\" styleOnly=\"true\" count=\"2\"/>", false,
          "", ""},
         {"", "text1=\"a\"", R"(<labelFrame id="a"/>)", "<addFrame type=\"labelFrame\"><label>Note</label></addFrame>",
