@@ -22,6 +22,7 @@
 #include <plotaid/ChartTransformer.h>
 #include <plotaid/ChartTranscoder.h>
 #include <plotaid/ChartVariable.h>
+#include <plotaid/FramePacker.h>
 #include <plotaid/Kovar_Format.h>
 #include <plotaid/splitInfo.h>
 #include <plotaid/TimeConverter.h>

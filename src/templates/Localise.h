@@ -27,6 +27,10 @@ void localiseChartTextAt(ChartString& text, const std::string& fullPath, const s
 // when the language is no plain name or there is no resource folder.
 bool localiseChartTextFor(ChartString& text, const std::string& language, const std::tm& now);
 
+// The GRAPH word of that key in the host language, in chart text; empty when no table has the key
+// or its text does not transcode.
+ChartString chartWord(const char* key);
+
 } // namespace plotaid::detail
 
 #endif

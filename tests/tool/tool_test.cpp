@@ -72,6 +72,11 @@ TEST(Tool, CommandLinesWithoutFiles) {
         {"template upgrade x", 2, {"unknown action 'upgrade'"}},
         {"template convert", 2, {"no template given"}},
         {"template convert /nonexistent.xml", 1, {"/nonexistent.xml: cannot open"}},
+        {"pack --help", 0, {"usage: plotaid pack CHART [--reference REF] [-o OUT]"}},
+        {"pack", 2, {"no chart given"}},
+        {"pack a b", 2, {"unexpected argument 'b'"}},
+        {"pack /nonexistent.xml", 1, {"/nonexistent.xml"}},
+        {"apply --help", 0, {"--pack lays out"}},
     };
     for (const auto& c : cases) {
         SCOPED_TRACE(c.args);
@@ -142,6 +147,23 @@ TEST(ToolTemplate, ConvertsEarlierFormsOnly) {
     const ToolResult broken = runTool("template convert '" + writeScratch("broken.xml", "<graph>") + "'");
     EXPECT_EQ(broken.exitCode, 1);
     EXPECT_TRUE(has(broken, "broken.xml:1:8: ")) << broken.output;
+}
+
+// The packed chart is sound and packs to itself; "apply --pack" packs after the templates.
+TEST(ToolPack, PacksTheChartAndAfterTemplates) {
+    useSourceGrammars();
+    const std::string chart = kCharts + "histogram.xml", out = writeScratch("packed.xml", "");
+    const std::string attached = "part=\"bottom\" target=\"frame_footnote_2\"";
+    ASSERT_EQ(runTool("pack '" + chart + "' -o '" + out + "'").exitCode, 0);
+    EXPECT_TRUE(has(runTool("validate '" + out + "'"), ": valid (chart")) << readText(out);
+    EXPECT_NE(readText(out).find(attached), std::string::npos);
+    EXPECT_EQ(runTool("pack '" + out + "' --reference '" + chart + "'").output, readText(out));
+    const std::string tidy = std::string(PLOTAID_EXAMPLES_DIR) + "/templates/bar-tidy.sgt";
+    for (const bool pack : {false, true}) {
+        const ToolResult r = runTool("apply --chart '" + chart + "' --template '" + tidy + "'" + (pack ? " --pack" : ""));
+        EXPECT_EQ(r.exitCode, 0) << r.output;
+        EXPECT_EQ(has(r, attached), pack);
+    }
 }
 
 } // namespace

@@ -1,5 +1,6 @@
 // plotaid apply --chart CHART [--data DATA] --template T [--template ...] [-o OUT] [--entire]
-// [--compressed] [--report]: applies templates to a chart with its data, in order, and writes it.
+// [--compressed] [--report] [--pack]: applies templates to a chart with its data, in order, and
+// writes it.
 // plotaid apply --template T [--template ...] -o OUTDIR [-j N] CHART...: the same for many charts.
 #include "ChartInput.h"
 #include "Command.h"
@@ -10,6 +11,9 @@
 #include "templates/TemplateConverter.h"
 
 #include <plotaid/ChartTransformer.h>
+#include <plotaid/FramePacker.h>
+
+#include <grx/GrxModel.h>
 
 #include <atomic>
 #include <cstdio>
@@ -65,11 +69,13 @@ struct Options {
     std::string chartPath, dataPath, outPath = "-";
     std::vector<std::string> templatePaths, charts;
     unsigned jobs = 1;
-    bool report = false, entire = false, packed = false;
+    bool report = false, entire = false, packed = false, layout = false;
 };
 
-// The chart as written, compressed when asked.
+// The chart as written, its frames laid out and compressed when asked.
 std::string written(ChartTransformer& chart, const Options& o) {
+    if (o.layout && chart.getVisualization())
+        FramePacker().packFrames(*chart.getVisualization(), nullptr);
     const std::string text = o.entire ? chart.getEntireXML(u"UTF-8") : chart.getXML();
     return text.empty() || !o.packed ? text : compressed(text);
 }
@@ -142,9 +148,9 @@ int run(const Args& args) {
     if (wantsHelp(args)) {
         std::printf(
             "usage: plotaid apply --chart CHART [--data DATA] --template TEMPLATE [--template ...]\n"
-            "                     [-o OUT] [--entire] [--compressed] [--report]\n"
+            "                     [-o OUT] [--entire] [--compressed] [--report] [--pack]\n"
             "       plotaid apply --template TEMPLATE [--template ...] -o OUTDIR [-j N]\n"
-            "                     [--entire] [--compressed] CHART...\n\n"
+            "                     [--entire] [--compressed] [--pack] CHART...\n\n"
             "Applies each template to the chart, in the order given, and writes the chart to OUT\n"
             "(standard output when -o is not given or is \"-\"). The chart must be valid chart XML,\n"
             "plain or compressed; templates of the earlier form are converted first.\n\n"
@@ -152,7 +158,8 @@ int run(const Args& args) {
             "             Without it, the data sources held in the chart itself are its data.\n"
             "The chart is written with its data sources as references unless --entire is given,\n"
             "which writes the whole document with the data put back in place of the references.\n"
-            "--compressed writes it compressed (zlib).\n\n"
+            "--compressed writes it compressed (zlib).\n"
+            "--pack lays out the chart's frames after the templates, as a host does (see 'plotaid pack').\n\n"
             "--report prints one line per instruction: the template, the instruction's position\n"
             "among the template's instructions, its tag, and what became of it:\n"
             "  applied          the action ran and reported no error\n"
@@ -191,6 +198,8 @@ int run(const Args& args) {
             o.entire = true;
         else if (a == "--compressed")
             o.packed = true;
+        else if (a == "--pack")
+            o.layout = true;
         else if (!a.empty() && a[0] != '-')
             o.charts.push_back(a);
         else
