@@ -27,6 +27,10 @@ void localiseChartTextAt(ChartString& text, const std::string& fullPath, const s
 // when the language is no plain name or there is no resource folder.
 bool localiseChartTextFor(ChartString& text, const std::string& language, const std::tm& now);
 
+// The GRAPH word of `key` in the host language ("Scale" and the like); the key itself when the
+// dictionary lacks it or there is no resource folder.
+ChartString chartWord(const std::string& key);
+
 } // namespace plotaid::detail
 
 #endif
