@@ -101,11 +101,11 @@ TEST_F(Effects, PlanesRotationShadowAndWireFrame) {
 
 TEST_F(Effects, BarAndPieDepth) {
     GrxVisualization& chart = sample("simple-bar.xml");
-    const std::string bars = "<addBarEffects theta=\"30\"><style number=\"2\" color=\"red\"/><style color=\"blue\"/></addBarEffects>";
+    const std::string bars = "<addBarEffects theta=\"30\"><style number=\"1\" color=\"green\"/><style number=\"2\" color=\"red\"/><style color=\"blue\"/></addBarEffects>";
     EXPECT_TRUE(act<TAddBarEffects>(bars, chart));
     EXPECT_TRUE(act<TAddBarEffects>(bars, chart));
     const GrrUviza& graph = *byId<GrrUviza>(chart, "frame_graph_1");
-    EXPECT_EQ(guides(graph), "frame:blue;0:silver;1:red;2:silver;");
+    EXPECT_EQ(guides(graph), "frame:blue;0:green;1:red;2:silver;");
     EXPECT_EQ(attr(byId<GrxStyle>(chart, "barStyle"), "depth"), "100%");
     EXPECT_EQ(byId<GrxCoordinates>(chart, "coordinates_1")->getDimensions().size(), 3u);
     EXPECT_EQ(childrenOf(chart, "coordinates_1", "obliqueTransform"), "{theta=30;}");
