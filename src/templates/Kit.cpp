@@ -282,6 +282,54 @@ void replaceCycle(BaseTemplate& action, GrxVisualization& target, CTAesthetic& a
     giveNewCycle(action, target, aesthetic, *cycle);
 }
 
+bool categoryList(const DOMElement* instruction, ChartString& list) {
+    const DOMElement* values = firstDescendantNamed(instruction, BaseTemplate::_categoryValue);
+    if (values == nullptr)
+        return false;
+    list = ChartString(values->getTextContent());
+    return true;
+}
+
+ChartString mappedCategories(const CTVariableType& variable, const ChartString& list, bool keepUnknown) {
+    const std::vector<GrxFormat*> formats = variable.getFormats();
+    ChartString joined;
+    bool first = true;
+    const std::u16string& text = list.str();
+    std::size_t start = 0;
+    while (start <= text.size()) {
+        std::size_t end = text.find(u';', start);
+        if (end == std::u16string::npos)
+            end = text.size();
+        const ChartString value(text.substr(start, end - start));
+        start = end + 1;
+        if (value.empty())
+            continue;
+        ChartString mapped;
+        if (!formats.empty())
+            for (const GrxRelabel* relabel : formats.front()->getRelabels())
+                if (value.equals(relabel->getTo())) {
+                    mapped = ChartString(relabel->getFrom());
+                    break;
+                }
+        if (mapped.empty() && keepUnknown)
+            mapped = value;
+        if (mapped.empty())
+            continue;
+        if (!first)
+            joined.append(u";");
+        joined.append(mapped);
+        first = false;
+    }
+    return joined;
+}
+
+GrxCategories& replaceCategories(GrxCategoricalDomain& domain, const ChartString& values) {
+    domain.removeCategoriess();
+    GrxCategories& categories = domain.addCategories();
+    categories.setTextContent(values.xc_str());
+    return categories;
+}
+
 std::string utf8(const XMLCh* text) {
     return ChartString(text).toUTF8();
 }

@@ -142,6 +142,17 @@ struct CycleInstruction {
     const DOMElement* cycle;
 };
 
+// ---- category lists ----------------------------------------------------------------------------------
+
+// The text of the instruction's first "categoryValue" descendant; false without one.
+bool categoryList(const DOMElement* instruction, ChartString& list);
+// The list's values (split at ";", empty ones skipped), each turned into the category value the
+// variable's first format relabels to it; a value no relabel knows is kept as given when
+// `keepUnknown`, else left out. Joined by ";".
+ChartString mappedCategories(const CTVariableType& variable, const ChartString& list, bool keepUnknown);
+// Every categories entry of the domain gives way to one holding `values`.
+GrxCategories& replaceCategories(GrxCategoricalDomain& domain, const ChartString& values);
+
 // ---- the source guard --------------------------------------------------------------------------------
 
 // The object of this id as the chart's own definition built it; null without a source. What it

@@ -79,16 +79,17 @@ bool localiseChartTextFor(ChartString& text, const std::string& language, const 
     return true;
 }
 
-ChartString chartWord(const char* key) {
+ChartString chartWord(const std::string& key) {
     const scratchloc::PathFinder* paths = resourcePaths();
     if (paths == nullptr)
-        return ChartString();
+        return ChartString(key);
     const Localiser l = localiserFor(paths->getFullPath(), paths->getBasePath());
     unsigned long status = 0;
-    const std::string host = l.dictionary.LookUp(key, status);
+    const std::string word = l.dictionary.LookUp(key, status);
     if (status != 0)
-        return ChartString();
-    return ChartTranscoder(l.codePage).transcode(host);
+        return ChartString(key);
+    const ChartString text = ChartTranscoder(l.codePage).transcode(word);
+    return text.empty() ? ChartString(key) : text;
 }
 
 } // namespace plotaid::detail

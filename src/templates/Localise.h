@@ -27,9 +27,9 @@ void localiseChartTextAt(ChartString& text, const std::string& fullPath, const s
 // when the language is no plain name or there is no resource folder.
 bool localiseChartTextFor(ChartString& text, const std::string& language, const std::tm& now);
 
-// The GRAPH word of that key in the host language, in chart text; empty when no table has the key
-// or its text does not transcode.
-ChartString chartWord(const char* key);
+// The GRAPH word of `key` in the host language ("Scale" and the like); the key itself when the
+// dictionary lacks it or there is no resource folder.
+ChartString chartWord(const std::string& key);
 
 } // namespace plotaid::detail
 

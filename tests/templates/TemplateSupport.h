@@ -161,6 +161,12 @@ protected:
     const DOMElement* instruction(const std::string& body) {
         return templateRoot(body)->getFirstElementChild();
     }
+    // The first instruction of `body` through the walk; whether it reported itself applied.
+    bool applyOnce(const std::string& body, GrxVisualization& chart) {
+        WalkReport report;
+        plotaid::detail::applyTemplateCommands(nullptr, chart, templateRoot(body));
+        return report.outcomes().size() == 1 && report.outcomes()[0].kind == InstructionOutcome::Applied;
+    }
     // The action T of the first instruction of `body`, applied once.
     template <class T>
     bool act(const std::string& body, GrxVisualization& target, const GrxVisualization* source = nullptr) {

@@ -167,3 +167,22 @@ TEST(ToolPack, PacksTheChartAndAfterTemplates) {
 }
 
 } // namespace
+
+namespace {
+
+// Popups from the command line: once per chart, with or without templates.
+TEST(ToolApply, PopupsOncePerChart) {
+    const std::string out = writeScratch("with-popups.xml", "");
+    const ToolResult first = runTool("apply --chart " + kCharts + "scatter.xml --popups -o " + out);
+    EXPECT_EQ(first.exitCode, 0) << first.output;
+    const std::string chart = readText(out);
+    EXPECT_NE(chart.find("tokenTemplate=\"Beginning Salary = $[1]$"), std::string::npos) << chart.substr(0, 300);
+    EXPECT_EQ(chartFaults(chart), "");
+    const ToolResult again = runTool("apply --chart " + out + " --popups -o " + out);
+    EXPECT_EQ(again.exitCode, 1);
+    EXPECT_TRUE(has(again, "the chart has popups already")) << again.output;
+    EXPECT_TRUE(has(runTool("apply --help"), "--popups"));
+    EXPECT_EQ(runTool("apply --chart " + out).exitCode, 2);
+}
+
+} // namespace

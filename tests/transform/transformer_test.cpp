@@ -194,8 +194,8 @@ TEST_F(TransformerTest, TemplatesAndPopups) {
     EXPECT_FALSE(t.applyTemplate("<template xmlns=\"http://plotaid.org/grxml\" "
                                  "xsi:schemaLocation=\"http://plotaid.org/grxml grxml-template-3.5.xsd\">"));
     EXPECT_EQ(t.getXML(), before);
-    EXPECT_EQ(t.addPopups(),
-              1u); // the instruction has no action yet, and still 1
+    EXPECT_EQ(t.addPopups(), 1u);
+    EXPECT_NE(t.getXML().find("tokenTemplate=\"Employment Category = $[1]$"), std::string::npos);
 
     Parsed chart(example("charts/simple-bar.xml"));
     ASSERT_NE(chart.vis->getElementById(u"interval_1"), nullptr);

@@ -1,6 +1,6 @@
 // plotaid apply --chart CHART [--data DATA] --template T [--template ...] [-o OUT] [--entire]
-// [--compressed] [--report] [--pack]: applies templates to a chart with its data, in order, and
-// writes it.
+// [--compressed] [--report] [--pack] [--popups]: applies templates to a chart with its data, in
+// order, adds popups and lays out its frames when asked, and writes it.
 // plotaid apply --template T [--template ...] -o OUTDIR [-j N] CHART...: the same for many charts.
 #include "ChartInput.h"
 #include "Command.h"
@@ -28,6 +28,7 @@ namespace plotaid::tool {
 namespace {
 
 constexpr const char* kName = "apply";
+constexpr const char* kPopupsRefused = "no popups added: the chart has popups already";
 
 const char* outcomeText(detail::InstructionOutcome::Kind kind) {
     switch (kind) {
@@ -69,7 +70,7 @@ struct Options {
     std::string chartPath, dataPath, outPath = "-";
     std::vector<std::string> templatePaths, charts;
     unsigned jobs = 1;
-    bool report = false, entire = false, packed = false, layout = false;
+    bool report = false, entire = false, packed = false, layout = false, popups = false;
 };
 
 // The chart as written, its frames laid out and compressed when asked.
@@ -91,6 +92,8 @@ std::string restyle(const std::string& chartPath, const std::vector<std::string>
     for (std::size_t i = 0; i < templates.size(); ++i)
         if (!chart.applyTemplate(templates[i]))
             return chartPath + ": " + unreadable(templatePaths[i], templates[i]);
+    if (o.popups && chart.addPopups() == 0)
+        return chartPath + ": " + kPopupsRefused;
     const std::string bytes = written(chart, o);
     if (bytes.empty())
         return chartPath + ": the chart could not be written";
@@ -148,9 +151,9 @@ int run(const Args& args) {
     if (wantsHelp(args)) {
         std::printf(
             "usage: plotaid apply --chart CHART [--data DATA] --template TEMPLATE [--template ...]\n"
-            "                     [-o OUT] [--entire] [--compressed] [--report] [--pack]\n"
+            "                     [-o OUT] [--entire] [--compressed] [--report] [--pack] [--popups]\n"
             "       plotaid apply --template TEMPLATE [--template ...] -o OUTDIR [-j N]\n"
-            "                     [--entire] [--compressed] [--pack] CHART...\n\n"
+            "                     [--entire] [--compressed] [--pack] [--popups] CHART...\n\n"
             "Applies each template to the chart, in the order given, and writes the chart to OUT\n"
             "(standard output when -o is not given or is \"-\"). The chart must be valid chart XML,\n"
             "plain or compressed; templates of the earlier form are converted first.\n\n"
@@ -160,6 +163,9 @@ int run(const Args& args) {
             "which writes the whole document with the data put back in place of the references.\n"
             "--compressed writes it compressed (zlib).\n"
             "--pack lays out the chart's frames after the templates, as a host does (see 'plotaid pack').\n\n"
+            "--popups gives every element, after the templates, a popup naming its x, y, z and legend\n"
+            "values; a chart that has popups already gets none and the command fails. With --popups\n"
+            "the templates may be left out.\n\n"
             "--report prints one line per instruction: the template, the instruction's position\n"
             "among the template's instructions, its tag, and what became of it:\n"
             "  applied          the action ran and reported no error\n"
@@ -194,6 +200,8 @@ int run(const Args& args) {
             o.jobs = static_cast<unsigned>(std::stoul(n));
         } else if (a == "--report")
             o.report = true;
+        else if (a == "--popups")
+            o.popups = true;
         else if (a == "--entire")
             o.entire = true;
         else if (a == "--compressed")
@@ -205,8 +213,8 @@ int run(const Args& args) {
         else
             return usageError(kName, "unexpected argument '" + a + "'");
     }
-    if (o.templatePaths.empty())
-        return usageError(kName, "no template given (--template TEMPLATE)");
+    if (o.templatePaths.empty() && !o.popups)
+        return usageError(kName, "no template given (--template TEMPLATE or --popups)");
     if (!o.charts.empty() && !o.chartPath.empty())
         return usageError(kName, "give the chart with --chart or as CHART..., not both");
     if (!o.charts.empty())
@@ -254,6 +262,11 @@ int run(const Args& args) {
         }
         if (outcomes.outcomes().empty())
             std::fprintf(reportOut, "%s: no instructions\n", path.c_str());
+    }
+
+    if (o.popups && chart.addPopups() == 0) {
+        std::fprintf(stderr, "plotaid %s: %s: %s\n", kName, chartPath.c_str(), kPopupsRefused);
+        allApplied = false;
     }
 
     const std::string bytes = written(chart, o);

@@ -159,9 +159,9 @@ TEST_F(Conversion, EarlierFormExamplesDoWhatTheirTwinsDo) {
             ++changed;
             EXPECT_EQ(grammar_test::chartFaults(a), "") << name << " on " << chart;
         }
-        // Style, axis and frame instructions take effect; lines and bins wait for their actions.
+        // Style, axis, frame and bin instructions take effect; the lines example waits for its own.
         const std::string kind(name);
-        EXPECT_EQ(changed > 0, kind == "styles" || kind == "axes" || kind == "frames") << name;
+        EXPECT_GT(changed, 0u) << name;
         if (kind == "styles") {
             EXPECT_EQ(changed, grammar_test::sampleCharts().size());
         }
