@@ -3,6 +3,7 @@
 #include "foundation/TextPlaceholders.h"
 
 #include <plotaid/ChartBase.h>
+#include <plotaid/ChartTranscoder.h>
 
 #include <msgbook/FacSTDictionary.h>
 #include <scratchloc/PathFactory.h>
@@ -76,6 +77,19 @@ bool localiseChartTextFor(ChartString& text, const std::string& language, const 
     const std::string base = paths->getBasePath();
     localiseChartTextAt(text, base + language + "/", base, now);
     return true;
+}
+
+ChartString localisedWord(const std::string& key) {
+    const scratchloc::PathFinder* paths = resourcePaths();
+    if (paths == nullptr)
+        return ChartString(key);
+    const Localiser l = localiserFor(paths->getFullPath(), paths->getBasePath());
+    unsigned long status = 0;
+    const std::string host = l.dictionary.LookUp(key, status);
+    if (status != 0)
+        return ChartString(key);
+    ChartString word = ChartTranscoder(l.codePage).transcode(host);
+    return word.empty() ? ChartString(key) : word;
 }
 
 } // namespace plotaid::detail

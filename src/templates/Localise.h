@@ -27,6 +27,9 @@ void localiseChartTextAt(ChartString& text, const std::string& fullPath, const s
 // when the language is no plain name or there is no resource folder.
 bool localiseChartTextFor(ChartString& text, const std::string& language, const std::tm& now);
 
+// The GRAPH word or message of `key` in the host's language; the key itself when no table has it.
+ChartString localisedWord(const std::string& key);
+
 } // namespace plotaid::detail
 
 #endif
