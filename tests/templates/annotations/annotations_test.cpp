@@ -94,8 +94,8 @@ TEST_F(Annotations, GuidesAddedDecoratedOrRefused) {
         {"simple-bar.xml", Prep::Relabel, line, "<addReferenceLine xcategorical='true' x='Office'/>", true, "lineGuide(x=Clerical;){}\n"},
         {"simple-bar.xml", Prep::Relabel, line, "<addReferenceLine xcategorical='true' x='Nobody' y='3'/>", true, ""},
         // A function line: fewer than 2 points means 100 segments; the expression is y.
-        {"line-series.xml", Prep::None, line, "<addReferenceLine numberPoints='1' y='3*x'/>", true, ""},
-        {"scatter.xml", Prep::None, line, "<addReferenceLine numberPoints='-4' y='3*x'/>", true,
+        {"line-series.xml", Prep::None, line, "<addReferenceLine numberPoints='-4' y='3*x'/>", true, ""},
+        {"scatter.xml", Prep::None, line, "<addReferenceLine numberPoints='1' y='3*x'/>", true,
          "functionGuide(segments=100;value=3*x;){}\n"},
         {"scatter.xml", Prep::None, line, "<addReferenceLine numberPoints='7' y='x' coordinate='1'/>", true, ""},
         // Polar graphs and tables of facets get none; a scatterplot matrix hides the line on the diagonal.
@@ -167,7 +167,9 @@ TEST_F(Annotations, StyleOnlyRestylesMatchingGuidesAndAddingTwiceAddsTwice) {
     const std::vector<GrxRectangleGuide*> boxes = allGraphs(chart).front()->getRectangleGuides();
     ASSERT_EQ(boxes.size(), 2u);
     // Any given end may select: without y2, a rectangle without y2 (the x range too) is taken.
-    EXPECT_EQ(attr(boxes[0]->getStyle(), "color") + attr(boxes[0], "zOrder") + attr(boxes[1]->getStyle(), "color"), "gold3gold");
+    EXPECT_EQ(attr(boxes[0]->getStyle(), "color") + attr(boxes[0], "zOrder") + attr(boxes[1]->getStyle(), "color") +
+                  attr(boxes[1], "zOrder"),
+              "gold3gold-");
     // Origin lines and reference lines add again; the extension names the newest origin line.
     act<TAddOriginLine>("<addOriginLine y='0'/>", chart);
     act<TAddOriginLine>("<addOriginLine y='0'/>", chart);
