@@ -33,8 +33,8 @@ TEST_F(TemplatesAsWritten, NeedNoSchemaLineAndTextThatIsNotXmlFailsWithTheParser
         std::string text;
         bool read;
         std::size_t instructions;
-    } rows[] = {{bare, true, 5},
-                {std::regex_replace(bare, std::regex(R"(\s+xmlns:xsi="[^"]*")"), ""), true, 5},
+    } rows[] = {{bare, true, 6},
+                {std::regex_replace(bare, std::regex(R"(\s+xmlns:xsi="[^"]*")"), ""), true, 6},
                 {open + "<madeUp/></template>", true, 0}, // no instruction: the earlier form, converted
                 {"<template xmlns=\"http://plotaid.org/other\"><setStyle type=\"bar\"/></template>", true, 0},
                 {open + "<setStyle>", false, 0},

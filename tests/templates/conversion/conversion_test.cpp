@@ -159,7 +159,7 @@ TEST_F(Conversion, EarlierFormExamplesDoWhatTheirTwinsDo) {
             ++changed;
             EXPECT_EQ(grammar_test::chartFaults(a), "") << name << " on " << chart;
         }
-        // Style, axis, frame and bin instructions take effect; the lines example waits for its own.
+        // Every example's instructions take effect now.
         const std::string kind(name);
         EXPECT_GT(changed, 0u) << name;
         if (kind == "styles") {

@@ -138,6 +138,9 @@ TEST_F(Designer, EachTemplateDoesWhatItIsFor) {
         {"presentation.sgt", "line-series.xml", "dim_x_majorTicks", "length=8pt"},
         // Axis instructions: the axes' own style, and the tick labels' style of every axis.
         {"presentation.sgt", "scatter.xml", "tickLabelStyle", "font-size=12pt"},
+        // Data labels the chart shows grow and keep apart.
+        {"presentation.sgt", "pie.xml", "legendTextStyle", "font-size=12pt font-weight=bold"},
+        {"presentation.sgt", "pie.xml", "interval_1", "showCollidingLabels=false"},
         {"corporate.sgt", "scatter.xml", "axisStyle", "color2=#1F4E79 stroke-width=0.75pt"},
     };
     for (const auto& row : rows) {

@@ -113,7 +113,7 @@ TEST_F(ChartTemplateLoading, TheToolReportsEveryInstructionOfABundledTemplate) {
     ChartTemplate t(sample("simple-bar.xml"), nullptr);
     ASSERT_TRUE(t.setTemplate(example("templates/bar-tidy.sgt")));
     t.applyTemplate();
-    ASSERT_EQ(report.outcomes().size(), 5u);
+    ASSERT_EQ(report.outcomes().size(), 6u);
     std::vector<std::string> expected;
     for (const InstructionOutcome& o : report.outcomes())
         expected.push_back("bar-tidy.sgt #" + std::to_string(o.position) + " " + o.tag + ": " + label(o) +
