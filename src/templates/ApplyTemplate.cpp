@@ -241,13 +241,14 @@ void applyTemplateCommands(const GrxVisualization* source, GrxVisualization& tar
         } catch (...) {
             thrown = "unknown exception";
         }
+        const bool resultCarriesNothing = dynamic_cast<const ResultCarriesNothing*>(action.get()) != nullptr;
         action.reset();
         if (report == nullptr)
             continue;
         std::string reason = firstError(*records);
         if (reason.empty() && !thrown.empty())
             reason = thrown;
-        if (reason.empty() && !applied)
+        if (reason.empty() && !applied && !resultCarriesNothing)
             reason = "the action reported that it changed nothing";
         if (!thrown.empty() && reason != thrown)
             reason += " (then threw: " + thrown + ")";

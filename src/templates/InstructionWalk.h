@@ -73,6 +73,10 @@ private:
     ScopedInstructionTable* outer_;
 };
 
+// Marks an action whose apply() answers false whatever it did: the walk then reports it applied
+// unless it logged an error, rather than as having changed nothing.
+struct ResultCarriesNothing {};
+
 // What became of one instruction, for a template author.
 struct InstructionOutcome {
     enum Kind { Applied, Unsupported, Failed };

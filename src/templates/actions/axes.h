@@ -89,7 +89,7 @@ public:
     bool apply() override;
 };
 
-class TAddDerivedAxis final : public BaseTemplate {
+class TAddDerivedAxis final : public BaseTemplate, public ResultCarriesNothing {
 public:
     using BaseTemplate::BaseTemplate;
     bool apply() override;

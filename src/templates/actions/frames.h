@@ -19,7 +19,7 @@ private:
     FrameList* frames_ = nullptr;
 };
 
-class THideFrame final : public BaseTemplate {
+class THideFrame final : public BaseTemplate, public ResultCarriesNothing {
 public:
     THideFrame(const GrxVisualization* source, GrxVisualization& target, const DOMElement* instruction);
     // Always false: hiding is never reported as a change.

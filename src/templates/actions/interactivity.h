@@ -7,7 +7,7 @@
 
 namespace plotaid::detail {
 
-class THistogramBinning final : public BaseTemplate {
+class THistogramBinning final : public BaseTemplate, public ResultCarriesNothing {
 public:
     THistogramBinning(const GrxVisualization* source, GrxVisualization& target,
                       const XERCES_CPP_NAMESPACE::DOMElement* instruction);

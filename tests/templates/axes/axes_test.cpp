@@ -244,4 +244,14 @@ TEST_F(Axes, SettingTwiceIsSettingOnceAndChartsStayValid) {
     }
 }
 
+// "addDerivedAxis" answers false whatever it did; the report goes by its errors instead.
+TEST_F(Axes, ADerivedAxisIsReportedByItsErrorsNotItsAnswer) {
+    WalkReport report;
+    walk(sample("scatter.xml"),
+         "<addDerivedAxis role=\"y\"><transform method=\"percent\"/></addDerivedAxis><setAxisInterval role=\"y2\"/>");
+    ASSERT_EQ(report.outcomes().size(), 2u);
+    EXPECT_EQ(report.outcomes()[0].kind, InstructionOutcome::Applied);
+    EXPECT_EQ(report.outcomes()[1].kind, InstructionOutcome::Failed);
+}
+
 } // namespace
