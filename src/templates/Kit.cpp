@@ -1,5 +1,7 @@
 #include "templates/Kit.h"
 
+#include "transform/ElementWalk.h"
+
 #include <grx/ChartPrinter.h>
 #include <grx/GrxUni.h>
 
@@ -156,25 +158,19 @@ std::vector<const DOMElement*> descendantsNamed(const DOMElement* element, const
     std::vector<const DOMElement*> found;
     if (element == nullptr)
         return found;
-    // Iterative preorder: a hostile template's depth must not become stack depth.
-    const DOMElement* node = element->getFirstElementChild();
-    while (node != nullptr) {
-        if (named(node, name))
-            found.push_back(node);
-        if (const DOMElement* child = node->getFirstElementChild()) {
-            node = child;
-            continue;
-        }
-        while (node != nullptr && node != element && node->getNextElementSibling() == nullptr)
-            node = static_cast<const DOMElement*>(node->getParentNode());
-        node = (node == nullptr || node == element) ? nullptr : node->getNextElementSibling();
-    }
+    for (const DOMElement* e = nextElement(element, element); e != nullptr; e = nextElement(element, e))
+        if (named(e, name))
+            found.push_back(e);
     return found;
 }
 
 const DOMElement* firstDescendantNamed(const DOMElement* element, const XMLCh* name) {
-    const std::vector<const DOMElement*> found = descendantsNamed(element, name);
-    return found.empty() ? nullptr : found.front();
+    if (element == nullptr)
+        return nullptr;
+    for (const DOMElement* e = nextElement(element, element); e != nullptr; e = nextElement(element, e))
+        if (named(e, name))
+            return e;
+    return nullptr;
 }
 
 ChartString directText(const DOMElement* element) {
@@ -212,9 +208,6 @@ CycleInstruction::CycleInstruction(const DOMElement* instruction)
       cycle(lastChildNamed(instruction, GrxUni::_cycle)) {}
 
 namespace {
-template <class T> bool isA(const CTElementType& element) {
-    return dynamic_cast<const T*>(&element) != nullptr;
-}
 bool noElement(const CTElementType&) {
     return false;
 }

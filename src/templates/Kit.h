@@ -122,6 +122,10 @@ const DOMElement* firstDescendantNamed(const DOMElement* element, const XMLCh* n
 // The element's own text: its direct text children joined, nested elements' text left out.
 ChartString directText(const DOMElement* element);
 
+template <class T> bool isA(const CTElementType& element) {
+    return dynamic_cast<const T*>(&element) != nullptr;
+}
+
 // The elements an instruction's "elementType" names (absent or unknown: every element). Labelings
 // are aesthetics, never elements: naming them takes no element.
 struct ElementKind {

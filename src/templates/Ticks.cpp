@@ -148,7 +148,8 @@ void BaseTemplate::styleMajorTicks(GrxMajorTicks& ticks, const DOMElement* eleme
         frame.setVisible(false);
     for (const DOMElement* style : descendantsNamed(firstDescendantNamed(element, _tickLabelStyle), GrxUni::_style))
         importStyle(style, unsignedAttribute(style, GrxUni::_number) == 1 ? frame : tickStyle);
-    if (GrxGridline* gridline = ticks.getGridline(); gridline && gridLinesOf(element))
+    // Without a "gridLines" part, styleGridLines leaves the grid line alone.
+    if (GrxGridline* gridline = ticks.getGridline())
         styleGridLines(&mark, *gridline, gridLinesOf(element));
 }
 
@@ -162,7 +163,8 @@ void BaseTemplate::styleMinorTicks(GrxMinorTicks& minor, const DOMElement* eleme
             mark.setColor(majorMark->getColor());
     if (const DOMElement* style = styleInside(element, GrxUni::_markStyle))
         importStyle(style, mark);
-    if (GrxGridline* gridline = minor.getGridline(); gridline && gridLinesOf(element))
+    // Without a "gridLines" part, styleGridLines leaves the grid line alone.
+    if (GrxGridline* gridline = minor.getGridline())
         styleGridLines(&mark, *gridline, gridLinesOf(element));
 }
 

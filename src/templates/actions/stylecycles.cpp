@@ -25,10 +25,6 @@ bool contains(const XMLCh* text, const XMLCh* part) {
     return ChartString(text).ContainsString(part);
 }
 
-template <class T> bool isA(const CTElementType& element) {
-    return dynamic_cast<const T*>(&element) != nullptr;
-}
-
 // The style an element's cycle colours: a box's hinge, else the element's own.
 GrxStyle& targetStyle(BaseTemplate& action, CTElementType& element) {
     if (auto* schema = dynamic_cast<GrxSchema*>(&element))
