@@ -1,0 +1,89 @@
+// A graph being drawn: its data area, the scales of its dimensions, and what marks need to place
+// and style what they draw. Marks (interval, line, point, ...) register themselves by element
+// name, like the template families, so each lives in its own file under marks/.
+#ifndef PLOTAID_RENDER_PLOT_H
+#define PLOTAID_RENDER_PLOT_H
+
+#include "render/Canvas.h"
+#include "render/Data.h"
+#include "render/Style.h"
+
+#include <cmath>
+#include <functional>
+#include <string>
+#include <vector>
+
+namespace plotaid::render {
+
+// One dimension's mapping of data to a fraction of the data area (0 at the axis origin).
+struct Scale {
+    bool categorical = false;
+    std::vector<std::string> categories;
+    double lo = NAN, hi = NAN;               // the data range the marks reported (continuous)
+    double lowerMargin = 0, upperMargin = 0; // fractions of the range
+    const Element* dimension = nullptr;
+
+    void include(double v);
+    // Settles the range: nice bounds, margins, zero for bars. Call once after every include.
+    void settle(bool includeZero);
+    double at(double value) const; // continuous: fraction
+    int indexOf(const std::string& category) const;
+    double atCategory(std::size_t index) const; // centre of the category's band
+    double band() const;                        // fraction per category (continuous: 0)
+    double from = 0, to = 1;                    // the settled range with margins
+};
+
+struct Plot;
+
+struct MarkKind {
+    const char* tag;
+    // Widens the scales by what the mark will draw.
+    void (*measure)(Plot& plot, const Element* mark);
+    void (*draw)(Plot& plot, const Element* mark);
+};
+// Adds a kind to the registry; use one static instance per mark file.
+struct MarkRegistrar {
+    explicit MarkRegistrar(const MarkKind& kind);
+};
+const MarkKind* markKind(const std::string& tag);
+
+struct Plot {
+    Canvas& canvas;
+    const StyleBook& styles;
+    const ChartData& data;
+    const Element* graph;
+    const Element* coordinates;
+    Rect area;               // the data area in device units
+    Scale dims[3];           // x, y and (for 3-D) z
+    bool transposed = false; // x runs vertically
+    bool polar = false;
+    bool reflected = false; // the reflection transform of a pyramid
+    double depth = 0;       // 3-D: the depth offset of the back plane, device units
+    // Rows of the data that this panel shows (empty: all rows).
+    std::vector<bool> rowFilter;
+
+    // Device position of the fractions fx (along x) and fy (along y, 0 at the bottom).
+    Point at(double fx, double fy) const;
+    bool rowShown(std::size_t row) const {
+        return rowFilter.empty() || (row < rowFilter.size() && rowFilter[row]);
+    }
+
+    // The column a mark's x, y or z child reads (null when it names none or an unknown variable).
+    const Column* columnOf(const Element* mark, const char* role) const;
+    // The style of a mark for one row: its own style, then each aesthetic's cycle style for the
+    // row's category (colour into the main or secondary colour, as the aesthetic affects).
+    Style rowStyle(const Element* mark, std::size_t row, const char* styleAttribute = "style") const;
+    // The style of the i-th entry of a cycle.
+    Style cycleStyle(const std::string& cycleId, std::size_t index) const;
+};
+
+// A statistic over values: "method" as charts write it (1 count, 2 mean, 3 percent of the total,
+// 4 sum, 5 median, 6 minimum/maximum are read by error bars, 10 count in a bin).
+double statistic(int method, const std::vector<double>& values, double total);
+
+// Number text the way an axis or label <format> asks (prefix, suffix, grouping, fraction digits).
+std::string formatNumber(double value, const Element* format);
+
+} // namespace plotaid::render
+
+#endif
