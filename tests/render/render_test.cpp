@@ -168,3 +168,36 @@ TEST(Render, RefusesWhatItCannotDraw) {
 }
 
 } // namespace
+
+namespace {
+
+TEST(RenderTool, WritesThePictureOrSaysWhyNot) {
+    const TempDir dir;
+    const std::string chart = std::string(PLOTAID_EXAMPLES_DIR) + "/charts/simple-bar.xml";
+    const std::string corporate = std::string(PLOTAID_EXAMPLES_DIR) + "/templates/corporate.sgt";
+    const struct {
+        std::string args;
+        int exitCode;
+        const char* says;
+    } rows[] = {
+        {chart + " -o " + dir.file("a.png") + " --size 320x240", 0, ""},
+        {chart + " --template " + corporate + " --before-after -o " + dir.file("b.png") + " --size 320x240",
+         0, ""},
+        {chart + " -o " + dir.file("a.bmp"), 2, ".svg, .png or .pdf"},
+        {chart + " -o " + dir.file("a.png") + " --size 10x10", 2, "WIDTHxHEIGHT"},
+        {chart + " --before-after -o " + dir.file("a.png"), 2, "needs at least one --template"},
+        {dir.file("missing.xml") + " -o " + dir.file("a.png"), 1, "cannot open"},
+        {chart + " --template " + dir.file("a.png") + " -o " + dir.file("c.png"), 1, "could not be applied"},
+    };
+    for (const auto& row : rows) {
+        SCOPED_TRACE(row.args);
+        const ToolResult r = runTool("render " + row.args);
+        EXPECT_EQ(r.exitCode, row.exitCode) << r.output;
+        EXPECT_NE(r.output.find(row.says), std::string::npos) << r.output;
+    }
+    // The side-by-side picture is twice as wide as the size asked for.
+    EXPECT_EQ(Image(readAll(dir.file("b.png"))).width(), 640);
+    EXPECT_EQ(Image(readAll(dir.file("a.png"))).height(), 240);
+}
+
+} // namespace
