@@ -70,7 +70,7 @@ std::vector<const Element*> marksOf(const Element* graph, const Element* coordin
     std::vector<const Element*> out;
     const std::string id = attr(coordinates, "id");
     for (const Element* e : children(graph)) {
-        if (markKind(nameOf(e)) == nullptr && !hasMarkVariant(nameOf(e)))
+        if (markKind(nameOf(e)) == nullptr)
             continue;
         const std::string uses = attr(e, "coordinates");
         if (uses == id || (uses.empty() && firstCoordinates))

@@ -47,13 +47,6 @@ const MarkVariant* markVariant(const Plot& plot, const Element* mark) {
     return nullptr;
 }
 
-bool hasMarkVariant(const std::string& tag) {
-    for (const MarkVariant& v : variants())
-        if (tag == v.tag)
-            return true;
-    return false;
-}
-
 void measureMark(Plot& plot, const Element* mark) {
     if (const MarkVariant* v = markVariant(plot, mark))
         v->measure(plot, mark);

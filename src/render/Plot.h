@@ -62,7 +62,6 @@ struct MarkVariantRegistrar {
     explicit MarkVariantRegistrar(const MarkVariant& variant);
 };
 const MarkVariant* markVariant(const Plot& plot, const Element* mark);
-bool hasMarkVariant(const std::string& tag);
 // A mark's measure and draw, through its variant when one applies; unknown kinds do nothing.
 void measureMark(Plot& plot, const Element* mark);
 void drawMark(Plot& plot, const Element* mark);
