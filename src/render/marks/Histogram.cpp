@@ -55,11 +55,15 @@ Bins binsOf(const Plot& plot, const Element* mark) {
     const double anchor = number(bin, "binStart", count >= 1 && !hasAttr(bin, "binWidth") ? *lo : NAN);
     const double origin = std::isfinite(anchor) ? anchor : 0;
     b.start = origin + std::floor((*lo - origin) / b.width) * b.width;
-    const auto n = static_cast<std::size_t>(std::floor((*hi - b.start) / b.width)) + 1;
-    b.counts.assign(std::min(n, kMaxBins), 0);
+    // An anchor so far off that the arithmetic loses the data starts at the data.
+    if (!std::isfinite(b.start) || b.start > *lo || *lo - b.start > b.width)
+        b.start = *lo;
+    const double n = std::floor((*hi - b.start) / b.width) + 1;
+    const double last = std::isfinite(n) ? std::clamp(n, 1.0, static_cast<double>(kMaxBins)) : 1.0;
+    b.counts.assign(static_cast<std::size_t>(last), 0);
     for (double d : v) {
-        const auto i = static_cast<std::size_t>(std::max(0.0, std::floor((d - b.start) / b.width)));
-        ++b.counts[std::min(i, b.counts.size() - 1)];
+        const double i = std::floor((d - b.start) / b.width);
+        ++b.counts[static_cast<std::size_t>(std::isfinite(i) ? std::clamp(i, 0.0, last - 1) : 0.0)];
     }
     b.total = v.size();
     return b;
