@@ -1,5 +1,7 @@
 #include "render/Graph.h"
 
+#include "render/Depth.h"
+
 #include <algorithm>
 #include <cmath>
 
@@ -37,7 +39,7 @@ std::vector<Tick> ticksOf(const Scale& s, const AxisParts& p) {
         return out;
     }
     for (double v : niceTicks(s.from, s.to, number(p.major, "delta", 0), 5))
-        out.push_back({s.at(v), formatNumber(v, child(p.major, "format"))});
+        out.push_back({s.at(v), formatNumber(s.mirrored ? std::fabs(v) : v, child(p.major, "format"))});
     return out;
 }
 
@@ -82,7 +84,7 @@ void drawCoordinates(const Page& page, const Element* graph, const Element* coor
     Canvas& canvas = page.canvas;
     const double unit = canvas.unit();
     Plot plot{canvas, page.styles, page.data, graph, coordinates, cell,
-              {},     false,       false,     false, 0,           rowFilter};
+              {},     false,       false,     false, 0,           rowFilter, {}};
     plot.transposed = child(coordinates, "transposeTransform") != nullptr;
     plot.polar = child(coordinates, "polarTransform") != nullptr;
     plot.reflected = child(coordinates, "reflectionTransform") != nullptr;
@@ -115,8 +117,8 @@ void drawCoordinates(const Page& page, const Element* graph, const Element* coor
         }
     }
     for (const Element* m : marks) {
-        bars = bars || nameOf(m) == "interval" || nameOf(m) == "area";
-        markKind(nameOf(m))->measure(plot, m);
+        bars = bars || startsAtZero(plot, m);
+        measureMark(plot, m);
     }
     for (std::size_t d = 0; d < 3; ++d)
         plot.dims[d].settle(bars && d == 1);
@@ -152,6 +154,7 @@ void drawCoordinates(const Page& page, const Element* graph, const Element* coor
         }
     plot.area = Rect{cell.x + leftRoom, cell.y + topRoom, std::max(1.0, cell.w - leftRoom - rightRoom),
                      std::max(1.0, cell.h - topRoom - bottomRoom)};
+    setUpDepth(plot);
 
     // Grid lines under the marks.
     if (!plot.polar)
@@ -169,7 +172,7 @@ void drawCoordinates(const Page& page, const Element* graph, const Element* coor
     canvas.pushClip(Rect{plot.area.x - 0.5 * plot.area.w, plot.area.y - 0.5 * plot.area.h, plot.area.w * 2,
                          plot.area.h * 2});
     for (const Element* m : marks)
-        markKind(nameOf(m))->draw(plot, m);
+        drawMark(plot, m);
     canvas.pop();
 
     if (plot.polar || !axes)

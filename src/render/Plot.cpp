@@ -24,6 +24,49 @@ const MarkKind* markKind(const std::string& tag) {
     return it == marks().end() ? nullptr : &it->second;
 }
 
+namespace {
+std::vector<MarkVariant>& variants() {
+    static std::vector<MarkVariant> all;
+    return all;
+}
+} // namespace
+
+MarkVariantRegistrar::MarkVariantRegistrar(const MarkVariant& variant) {
+    auto& all = variants();
+    // Sorted on entry, since registration order across files is unspecified.
+    all.insert(std::upper_bound(all.begin(), all.end(), variant,
+                                [](const MarkVariant& a, const MarkVariant& b) { return a.order < b.order; }),
+               variant);
+}
+
+const MarkVariant* markVariant(const Plot& plot, const Element* mark) {
+    const std::string tag = nameOf(mark);
+    for (const MarkVariant& v : variants())
+        if (tag == v.tag && v.applies(plot, mark))
+            return &v;
+    return nullptr;
+}
+
+void measureMark(Plot& plot, const Element* mark) {
+    if (const MarkVariant* v = markVariant(plot, mark))
+        v->measure(plot, mark);
+    else if (const MarkKind* k = markKind(nameOf(mark)))
+        k->measure(plot, mark);
+}
+
+void drawMark(Plot& plot, const Element* mark) {
+    if (const MarkVariant* v = markVariant(plot, mark))
+        v->draw(plot, mark);
+    else if (const MarkKind* k = markKind(nameOf(mark)))
+        k->draw(plot, mark);
+}
+
+bool startsAtZero(const Plot& plot, const Element* mark) {
+    if (const MarkVariant* v = markVariant(plot, mark))
+        return v->fromZero;
+    return nameOf(mark) == "interval" || nameOf(mark) == "area";
+}
+
 void Scale::include(double v) {
     if (!std::isfinite(v))
         return;

@@ -22,6 +22,7 @@ struct Scale {
     double lo = NAN, hi = NAN;               // the data range the marks reported (continuous)
     double lowerMargin = 0, upperMargin = 0; // fractions of the range
     const Element* dimension = nullptr;
+    bool mirrored = false; // values left of zero read as their size (a pyramid's two sides)
 
     void include(double v);
     // Settles the range: nice bounds, margins, zero for bars. Call once after every include.
@@ -47,6 +48,26 @@ struct MarkRegistrar {
 };
 const MarkKind* markKind(const std::string& tag);
 
+// A special form of a kind (a pie, a histogram, error bars) that takes over the kind's measure and
+// draw for the marks it applies to; lower `order` is asked first.
+struct MarkVariant {
+    const char* tag;
+    int order;
+    bool (*applies)(const Plot& plot, const Element* mark);
+    void (*measure)(Plot& plot, const Element* mark);
+    void (*draw)(Plot& plot, const Element* mark);
+    bool fromZero; // whether the value axis must take in zero
+};
+struct MarkVariantRegistrar {
+    explicit MarkVariantRegistrar(const MarkVariant& variant);
+};
+const MarkVariant* markVariant(const Plot& plot, const Element* mark);
+// A mark's measure and draw, through its variant when one applies; unknown kinds do nothing.
+void measureMark(Plot& plot, const Element* mark);
+void drawMark(Plot& plot, const Element* mark);
+// Whether the mark is drawn from zero up (bars and areas), so the value scale must hold zero.
+bool startsAtZero(const Plot& plot, const Element* mark);
+
 struct Plot {
     Canvas& canvas;
     const StyleBook& styles;
@@ -61,6 +82,7 @@ struct Plot {
     double depth = 0;       // 3-D: the depth offset of the back plane, device units
     // Rows of the data that this panel shows (empty: all rows).
     std::vector<bool> rowFilter;
+    Point back; // 3-D: device offset from the front to the back plane
 
     // Device position of the fractions fx (along x) and fy (along y, 0 at the bottom).
     Point at(double fx, double fy) const;

@@ -94,4 +94,14 @@ Grouping group(const Plot& plot, const Element* mark) {
     return g;
 }
 
+Slot slotOf(const Plot& plot, const Grouping& g, const Summary& s) {
+    const Scale& sx = plot.dims[0];
+    Slot slot{sx.categorical ? sx.atCategory(s.xIndex) : sx.at(s.x), sx.categorical ? sx.band() : 0.02};
+    if (hasAttr(sx.dimension, "clusterVariable") && g.split != nullptr && g.splits > 1) {
+        slot.band /= static_cast<double>(g.splits);
+        slot.centre += (static_cast<double>(s.splitIndex) - static_cast<double>(g.splits - 1) / 2.0) * slot.band;
+    }
+    return slot;
+}
+
 } // namespace plotaid::render

@@ -31,6 +31,13 @@ int methodOf(const Element* mark, int fallback);
 // Groups the shown rows of `mark` by x and split, applying its statistic.
 Grouping group(const Plot& plot, const Element* mark);
 
+// Where a summary stands along x, as a fraction: the centre and the width of its slot, which is
+// the category's band shared among the clusters when x is clustered.
+struct Slot {
+    double centre = 0, band = 0;
+};
+Slot slotOf(const Plot& plot, const Grouping& g, const Summary& s);
+
 } // namespace plotaid::render
 
 #endif
