@@ -98,7 +98,8 @@ Style Plot::cycleStyle(const std::string& cycleId, std::size_t index) const {
 
 Style Plot::rowStyle(const Element* mark, std::size_t row, const char* styleAttribute) const {
     Style s = styles.resolve(mark, styleAttribute);
-    static const char* const kAesthetics[] = {"color", "shape", "size", "dash", "pattern", "transparency"};
+    static const char* const kAesthetics[] = {"color", "shape", "size", "dash", "pattern", "transparency",
+                                              "styleBy"};
     for (const char* kind : kAesthetics)
         for (const Element* a : children(mark, kind)) {
             const std::string variable = attr(a, "variable");
