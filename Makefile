@@ -9,7 +9,7 @@ JOBS       ?= $(shell nproc)
 FUZZ_SECONDS ?= 30
 CMAKE_FLAGS ?=
 
-.PHONY: all deps build test test-sanitize test-tsan demo bench fuzz fuzz-smoke format clean
+.PHONY: all deps build test test-sanitize test-tsan demo gallery bench fuzz fuzz-smoke format clean
 
 all: build
 
@@ -51,6 +51,10 @@ test-tsan: deps $(TSAN_BUILD)/build.ninja
 
 demo: build
 	@scripts/demo $(BUILD)/bin/plotaid
+
+# Every sample chart before and after each designer template, as PNG files in docs/gallery/.
+gallery: build
+	@scripts/gallery $(BUILD)/bin/plotaid
 
 $(BENCH_BUILD)/build.ninja:
 	cmake -S . -B $(BENCH_BUILD) -G Ninja -DCMAKE_BUILD_TYPE=Release -DPLOTAID_BUILD_TESTS=OFF -DPLOTAID_BUILD_BENCH=ON $(CMAKE_FLAGS)

@@ -29,18 +29,22 @@ std::string familyOf(const Style& s) {
     return f;
 }
 
+PangoFontDescription* fontOf(const Style& s, double unit) {
+    PangoFontDescription* font = pango_font_description_new();
+    pango_font_description_set_family(font, familyOf(s).c_str());
+    const double size = std::clamp(s.fontSize.value_or(9.0), 1.0, 200.0) * unit;
+    pango_font_description_set_absolute_size(font, size * PANGO_SCALE);
+    pango_font_description_set_weight(font, s.bold.value_or(false) ? PANGO_WEIGHT_BOLD : PANGO_WEIGHT_NORMAL);
+    pango_font_description_set_style(font,
+                                     s.italic.value_or(false) ? PANGO_STYLE_ITALIC : PANGO_STYLE_NORMAL);
+    return font;
+}
+
 struct Layout {
     PangoLayout* layout;
     explicit Layout(cairo_t* cr, const std::string& text, const Style& s, double unit) {
         layout = pango_cairo_create_layout(cr);
-        PangoFontDescription* font = pango_font_description_new();
-        pango_font_description_set_family(font, familyOf(s).c_str());
-        const double size = std::clamp(s.fontSize.value_or(9.0), 1.0, 200.0) * unit;
-        pango_font_description_set_absolute_size(font, size * PANGO_SCALE);
-        pango_font_description_set_weight(font,
-                                          s.bold.value_or(false) ? PANGO_WEIGHT_BOLD : PANGO_WEIGHT_NORMAL);
-        pango_font_description_set_style(font,
-                                         s.italic.value_or(false) ? PANGO_STYLE_ITALIC : PANGO_STYLE_NORMAL);
+        PangoFontDescription* font = fontOf(s, unit);
         pango_layout_set_font_description(layout, font);
         pango_font_description_free(font);
         pango_layout_set_text(layout, text.c_str(), static_cast<int>(text.size()));
@@ -242,9 +246,14 @@ TextSize Canvas::measure(const std::string& text, const Style& s) const {
 void Canvas::text(const std::string& text, Point anchor, const Style& s, double ax, double ay, double angle) {
     if (text.empty() || !s.visible.value_or(true) || !std::isfinite(anchor.x) || !std::isfinite(anchor.y))
         return;
-    const Rgba ink = s.color2 && s.color2->a > 0 ? *s.color2 : Rgba{0, 0, 0, 1};
+    // A text style's main colour is its ink; a transparent ink hides the text.
+    const Rgba ink = s.color ? *s.color : Rgba{0, 0, 0, 1};
+    if (ink.a <= 0)
+        return;
     Layout layout(cr_, validUtf8(text), s, unit_);
     const TextSize size = layout.size();
+    if (format_ == OutputFormat::Svg)
+        noteFont(s);
     cairo_save(cr_);
     cairo_translate(cr_, anchor.x, anchor.y);
     if (std::isfinite(angle))
@@ -265,6 +274,56 @@ void Canvas::pop() {
     cairo_restore(cr_);
 }
 
+void Canvas::noteFont(const Style& s) {
+    const std::string requested = familyOf(s) + (s.bold.value_or(false) ? "|bold" : "|normal") +
+                                  (s.italic.value_or(false) ? "|italic" : "|normal");
+    auto it = resolved_.find(requested);
+    if (it == resolved_.end()) {
+        std::string actual = requested;
+        PangoFontDescription* wanted = fontOf(s, 1);
+        PangoLayout* probe = pango_cairo_create_layout(cr_);
+        if (PangoFont* font = pango_context_load_font(pango_layout_get_context(probe), wanted)) {
+            PangoFontDescription* got = pango_font_describe(font);
+            if (const char* family = pango_font_description_get_family(got))
+                actual = family + requested.substr(requested.find('|'));
+            pango_font_description_free(got);
+            g_object_unref(font);
+        }
+        g_object_unref(probe);
+        pango_font_description_free(wanted);
+        it = resolved_.emplace(requested, actual).first;
+    }
+    fonts_.insert(it->second);
+}
+
+namespace {
+std::string escaped(const std::string& text) {
+    std::string out;
+    for (char c : text)
+        out += c == '"'   ? std::string("&quot;")
+               : c == '&' ? std::string("&amp;")
+               : c == '<' ? std::string("&lt;")
+                          : std::string(1, c);
+    return out;
+}
+} // namespace
+
+// The fonts go into the SVG's metadata, right after the root's start tag.
+std::string Canvas::svgWithFonts(std::string svg) const {
+    const std::size_t root = svg.find("<svg");
+    const std::size_t end = root == std::string::npos ? root : svg.find('>', root);
+    if (end == std::string::npos || fonts_.empty())
+        return svg;
+    std::string meta = "\n<metadata><fonts xmlns=\"http://plotaid.org/render\">";
+    for (const std::string& f : fonts_) {
+        const std::size_t a = f.find('|'), b = f.find('|', a + 1);
+        meta += "<font font-family=\"" + escaped(f.substr(0, a)) + "\" font-weight=\"" +
+                f.substr(a + 1, b - a - 1) + "\" font-style=\"" + f.substr(b + 1) + "\"/>";
+    }
+    meta += "</fonts></metadata>";
+    return svg.insert(end + 1, meta);
+}
+
 std::string Canvas::finish() {
     if (finished_ || !ok())
         return {};
@@ -277,6 +336,8 @@ std::string Canvas::finish() {
         cairo_surface_finish(surface_);
         if (cairo_surface_status(surface_) != CAIRO_STATUS_SUCCESS)
             return {};
+        if (format_ == OutputFormat::Svg)
+            return svgWithFonts(std::move(bytes_));
     }
     return std::move(bytes_);
 }

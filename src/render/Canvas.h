@@ -5,7 +5,9 @@
 
 #include "render/Style.h"
 
+#include <map>
 #include <memory>
+#include <set>
 #include <string>
 #include <vector>
 
@@ -53,7 +55,7 @@ public:
     // A marker of the style's symbol and size centred on `p`.
     void symbol(Point p, const Style& s);
 
-    // Text in the style's font and secondary colour. `ax`/`ay` place the anchor: 0 left/top,
+    // Text in the style's font and main colour. `ax`/`ay` place the anchor: 0 left/top,
     // 0.5 centre, 1 right/bottom; the text turns `angle` degrees counterclockwise about it.
     TextSize measure(const std::string& text, const Style& s) const;
     void text(const std::string& text, Point anchor, const Style& s, double ax = 0, double ay = 0,
@@ -73,6 +75,13 @@ private:
     void applyStroke(const Style& s);
     bool stroke(const Style& s) const;
     bool fill(const Style& s) const;
+
+    // The fonts text was drawn in, as the machine resolved them: an SVG names them, since its text
+    // is drawn as glyph outlines.
+    void noteFont(const Style& s);
+    std::string svgWithFonts(std::string svg) const;
+    std::map<std::string, std::string> resolved_; // requested -> "family|weight|style"
+    std::set<std::string> fonts_;
 
     OutputFormat format_;
     double width_, height_, unit_;

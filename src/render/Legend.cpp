@@ -32,12 +32,12 @@ Metrics metricsOf(const Page& page, const Element* legend) {
     const double u = page.canvas.unit();
     Metrics m{};
     const Style frame = page.styles.resolve(legend, "style", page.styles.chart());
-    m.text = page.styles.resolve(legend, "tickTextStyle", frame);
+    m.text = page.styles.resolve(legend, "tickTextStyle", page.styles.chart());
     const Element* label = child(legend, "label");
-    m.title = page.styles.resolve(label, "style", frame);
+    m.title = page.styles.resolve(label, "style", page.styles.chart());
     m.swatch = std::max(8 * u, page.canvas.measure("Xg", m.text).h * 0.8);
     m.gap = 3 * u;
-    m.pad = frame.size.value_or(3) * u;
+    m.pad = frame.padding.value_or(3) * u;
     m.titleH =
         label && m.title.visible.value_or(true) ? page.canvas.measure(textOf(label), m.title).h + m.gap : 0;
     return m;

@@ -35,9 +35,8 @@ bool needsPacking(const Element* root) {
 
 TextSize labelFrameSize(const Page& page, const Element* frame) {
     TextSize total;
-    const Style frameStyle = page.styles.resolve(frame, "style", page.styles.chart());
     for (const Element* label : children(frame, "label")) {
-        const Style s = page.styles.resolve(label, "style", frameStyle);
+        const Style s = page.styles.resolve(label, "style", page.styles.chart());
         const TextSize t = page.canvas.measure(textOf(label), s);
         total.w = std::max(total.w, t.w);
         total.h += t.h;
@@ -54,7 +53,7 @@ void drawLabelFrame(const Page& page, const Element* frame, const Rect& at) {
     const double pad = 2 * page.canvas.unit();
     double y = at.y + pad;
     for (const Element* label : children(frame, "label")) {
-        const Style s = page.styles.resolve(label, "style", frameStyle);
+        const Style s = page.styles.resolve(label, "style", page.styles.chart());
         const std::string text = textOf(label);
         const std::string align = s.align.value_or("left");
         const double ax = align == "center" ? 0.5 : align == "right" ? 1 : 0;

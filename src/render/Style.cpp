@@ -88,6 +88,7 @@ void Style::layer(const Style& o) {
     take(pattern, o.pattern);
     take(align, o.align);
     take(labelAngle, o.labelAngle);
+    take(padding, o.padding);
 }
 
 Style Style::of(const Element* e) {
@@ -143,6 +144,7 @@ Style Style::of(const Element* e) {
         s.pattern = attr(e, "fill-pattern");
     if (hasAttr(e, "textAlignment"))
         s.align = attr(e, "textAlignment");
+    s.padding = points(e, "padding");
     if (hasAttr(e, "labelAngle"))
         s.labelAngle = number(e, "labelAngle", 0);
     return s;

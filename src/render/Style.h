@@ -36,6 +36,7 @@ struct Style {
     std::optional<std::string> pattern; // fill-pattern
     std::optional<std::string> align;   // textAlignment
     std::optional<double> labelAngle;
+    std::optional<double> padding; // points
 
     // Properties of `over` replace those of this style.
     void layer(const Style& over);
