@@ -121,9 +121,7 @@ void drawLegend(const Page& page, const Element* legend, const Rect& at) {
         const Rect box{at.x + m.pad, y + (rowH - m.swatch) / 2, e.markName == "line" ? swatchW : m.swatch,
                        m.swatch};
         if (e.markName == "line") {
-            Style stroke = e.style;
-            if (!stroke.color2 || stroke.color2->a == 0)
-                stroke.color2 = stroke.color;
+            const Style stroke = lineStroke(e.style);
             page.canvas.line({box.x, box.y + box.h / 2}, {box.right(), box.y + box.h / 2}, stroke);
             if (stroke.symbol && *stroke.symbol != "none") {
                 Style marker = stroke;

@@ -142,6 +142,12 @@ Style Plot::rowStyle(const Element* mark, std::size_t row, const char* styleAttr
     return s;
 }
 
+Style lineStroke(Style s) {
+    if (!s.color2 || s.color2->a == 0)
+        s.color2 = s.color;
+    return s;
+}
+
 double statistic(int method, const std::vector<double>& values, double total) {
     std::vector<double> v;
     for (double d : values)

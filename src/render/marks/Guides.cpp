@@ -173,8 +173,13 @@ void spanOf(const Plot& plot, std::size_t d, const std::string& a, const std::st
         std::swap(from, to);
 }
 
+// Only the guide's own styles: the chart's black outline would hide the colour a template gives.
+// A guide no style colours is drawn in black.
 Style guideStyle(const Plot& plot, const Element* guide) {
-    return plot.styles.resolve(guide, "style", plot.styles.chart());
+    Style s = plot.styles.resolve(guide, "style");
+    if (!s.color && !s.color2)
+        s.color2 = Rgba{0, 0, 0, 1};
+    return s;
 }
 
 // The guide's label on the span from a to b (device points, b the far end), placed as its style
@@ -228,7 +233,7 @@ void drawLine(Plot& plot, const Element* guide) {
             continue;
         const Point a = d == 0 ? plot.at(f, 0) : plot.at(0, f);
         const Point b = d == 0 ? plot.at(f, 1) : plot.at(1, f);
-        plot.canvas.line(a, b, style);
+        plot.canvas.line(a, b, lineStroke(style));
         // Where x runs up the page, a line at an x value lies across it.
         drawGuideLabel(plot, guide, a, b, (d == 0) != plot.transposed);
     }
@@ -250,7 +255,7 @@ void drawFunction(Plot& plot, const Element* guide) {
         points.push_back(std::isfinite(y) ? plot.at(sx.at(x), plot.dims[1].at(y)) : Point{NAN, NAN});
     }
     plot.canvas.pushClip(plot.area);
-    plot.canvas.polyline(points, guideStyle(plot, guide));
+    plot.canvas.polyline(points, lineStroke(guideStyle(plot, guide)));
     std::vector<Point> drawn;
     std::copy_if(points.begin(), points.end(), std::back_inserter(drawn),
                  [&](const Point& p) { return std::isfinite(p.x + p.y) && p.y >= plot.area.y && p.y <= plot.area.bottom(); });

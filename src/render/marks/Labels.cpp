@@ -58,10 +58,7 @@ std::string labelText(const Plot& plot, const Element* labeling, const Element* 
 }
 
 Style textStyleOf(const Plot& plot, const Element* label) {
-    Style style = plot.styles.resolve(label, "style", plot.styles.chart());
-    if (const Style own = plot.styles.resolve(label, "style"); own.color && own.color->a > 0)
-        style.color2 = own.color;
-    return style;
+    return plot.styles.resolve(label, "style", plot.styles.chart());
 }
 
 void framedText(Canvas& canvas, const std::string& text, Point anchor, const Style& style, const Style& frame,

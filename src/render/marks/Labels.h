@@ -19,7 +19,7 @@ LabelPlace labelPlaceOf(const Plot& plot, const Element* e, const char* styleAtt
 std::string labelText(const Plot& plot, const Element* labeling, const Element* mark,
                       const std::vector<std::size_t>& rows, std::size_t total);
 
-// The text style of a label or labeling: its font over the chart's, its colour as the ink.
+// The text style of a label or labeling, over the chart's.
 Style textStyleOf(const Plot& plot, const Element* label);
 
 // Text in `style` with a frame of `frame` around it, its anchor placed as in Canvas::text.

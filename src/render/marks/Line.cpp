@@ -24,14 +24,6 @@ bool interpolates(const Element* mark) {
     return b == "2" || b == "interpolated";
 }
 
-// A line strokes in its secondary colour, or in its colour where the style leaves that out
-// (fit lines are coloured that way).
-Style strokeOf(Style s) {
-    if (!s.color2 || s.color2->a == 0)
-        s.color2 = s.color;
-    return s;
-}
-
 // Markers are filled with the line's colour where they have no fill of their own.
 Style markerOf(const Style& line) {
     Style m = line;
@@ -188,7 +180,7 @@ void drawFit(Plot& plot, const Element* mark) {
                 curve.push_back(plot.at(fx, sy.at(yv)));
             }
         }
-        const Style style = strokeOf(plot.rowStyle(mark, f.firstRow));
+        const Style style = lineStroke(plot.rowStyle(mark, f.firstRow));
         plot.canvas.pushClip(plot.area);
         plot.canvas.polyline(curve, style);
         plot.canvas.polyline(upper, style);
@@ -232,7 +224,7 @@ void drawLine(Plot& plot, const Element* mark) {
         const auto first = std::find_if(path.begin(), path.end(), [](const Summary* s) { return s; });
         if (first == path.end())
             continue;
-        const Style style = strokeOf(plot.rowStyle(mark, (*first)->firstRow));
+        const Style style = lineStroke(plot.rowStyle(mark, (*first)->firstRow));
         const std::vector<Point> points = pointsOf(plot, g, path, interpolate);
         plot.canvas.polyline(shaped(points, method), style);
         if (hasMarkers(style))
