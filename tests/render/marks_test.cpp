@@ -97,6 +97,9 @@ TEST(RenderMarks, SecondCoordinatesShareTheDataAreaOfTheFirst) {
     EXPECT_NEAR(line.first + line.last, bars.first + bars.last, 4);
     EXPECT_GT(line.first, bars.first);
     EXPECT_LT(line.last, bars.last);
+    // Both y axes keep their room: tick labels left of the bars and right of them.
+    EXPECT_GT(bars.first, kX0 + 60);
+    EXPECT_LT(bars.last, kX1 - 50);
 }
 
 TEST(RenderMarks, GuidesFromTemplatesTakeTheirStyleColour) {

@@ -66,7 +66,16 @@ private:
     }
     double power() {
         const double v = unary();
-        return take('^') ? std::pow(v, power()) : v;
+        if (!take('^'))
+            return v;
+        // "x^x^x..." nests without brackets, so it counts towards the depth as well.
+        if (++depth_ > kMaxDepth) {
+            ok_ = false;
+            return NAN;
+        }
+        const double e = power();
+        --depth_;
+        return std::pow(v, e);
     }
     double unary() {
         if (++depth_ > kMaxDepth) {
