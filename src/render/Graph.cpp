@@ -79,18 +79,43 @@ std::vector<const Element*> marksOf(const Element* graph, const Element* coordin
     return out;
 }
 
-void drawCoordinates(const Page& page, const Element* graph, const Element* coordinates, const Rect& cell,
-                     const std::vector<bool>& rowFilter, bool axes, int index) {
+namespace {
+
+// One set of coordinates measured but not yet drawn: its scales, ticks and the room its axes need
+// on each side of the data area.
+struct Prepared {
+    Plot plot;
+    std::vector<const Element*> dimensions, marks;
+    std::vector<std::vector<Tick>> ticks = std::vector<std::vector<Tick>>(2);
+    std::vector<AxisParts> parts = std::vector<AxisParts>(2);
+    std::vector<Style> labelStyles = std::vector<Style>(2);
+    double leftRoom = 0, bottomRoom = 0, rightRoom = 0, topRoom = 0;
+};
+
+Prepared prepare(const Page& page, const Element* graph, const Element* coordinates, const Rect& cell,
+                 const std::vector<bool>& rowFilter, bool axes, int index) {
     Canvas& canvas = page.canvas;
     const double unit = canvas.unit();
-    Plot plot{canvas, page.styles, page.data, graph, coordinates, cell,
-              {},     false,       false,     false, 0,           rowFilter, {}};
+    Prepared prepared{Plot{canvas,
+                           page.styles,
+                           page.data,
+                           graph,
+                           coordinates,
+                           cell,
+                           {},
+                           false,
+                           false,
+                           false,
+                           0,
+                           rowFilter,
+                           {}},
+                      children(coordinates, "dimension"), marksOf(graph, coordinates, index == 0)};
+    Plot& plot = prepared.plot;
     plot.transposed = child(coordinates, "transposeTransform") != nullptr;
     plot.polar = child(coordinates, "polarTransform") != nullptr;
     plot.reflected = child(coordinates, "reflectionTransform") != nullptr;
-    const auto dimensions = children(coordinates, "dimension");
-    const auto marks = marksOf(graph, coordinates, index == 0);
-
+    const auto& dimensions = prepared.dimensions;
+    const auto& marks = prepared.marks;
     // Categorical dimensions take their categories from the domain or from the first mark
     // variable in that role.
     static const char* const kRoles[] = {"x", "y", "z"};
@@ -125,10 +150,9 @@ void drawCoordinates(const Page& page, const Element* graph, const Element* coor
 
     // Room for the axes: tick labels and the axis label outside the data area.
     const bool xOnLeft = plot.transposed;
-    std::vector<std::vector<Tick>> ticks(2);
-    std::vector<AxisParts> parts(2);
-    std::vector<Style> labelStyles(2);
-    double leftRoom = 0, bottomRoom = 0, rightRoom = 0, topRoom = 0;
+    auto& ticks = prepared.ticks;
+    auto& parts = prepared.parts;
+    auto& labelStyles = prepared.labelStyles;
     if (!plot.polar)
         for (std::size_t d = 0; d < 2 && d < dimensions.size(); ++d) {
             parts[d] = partsOf(dimensions[d]);
@@ -149,14 +173,25 @@ void drawCoordinates(const Page& page, const Element* graph, const Element* coor
             const Style labelStyle = page.styles.resolve(label, "style", page.styles.chart());
             if (label && labelStyle.visible.value_or(true))
                 room += canvas.measure(textOf(label), labelStyle).h + 2 * unit;
-            double& side = vertical ? (opposite ? rightRoom : leftRoom) : (opposite ? topRoom : bottomRoom);
+            double& side = vertical ? (opposite ? prepared.rightRoom : prepared.leftRoom)
+                                    : (opposite ? prepared.topRoom : prepared.bottomRoom);
             side = std::max(side, room);
         }
-    plot.area = Rect{cell.x + leftRoom, cell.y + topRoom, std::max(1.0, cell.w - leftRoom - rightRoom),
-                     std::max(1.0, cell.h - topRoom - bottomRoom)};
-    setUpDepth(plot);
+    return prepared;
+}
 
-    // Grid lines under the marks.
+Rect areaWithin(const Rect& cell, double left, double right, double top, double bottom) {
+    return Rect{cell.x + left, cell.y + top, std::max(1.0, cell.w - left - right),
+                std::max(1.0, cell.h - top - bottom)};
+}
+
+// Grid lines under the marks.
+void drawGrid(const Page& page, Prepared& p) {
+    Canvas& canvas = page.canvas;
+    Plot& plot = p.plot;
+    const auto& dimensions = p.dimensions;
+    const auto& parts = p.parts;
+    const auto& ticks = p.ticks;
     if (!plot.polar)
         for (std::size_t d = 0; d < 2 && d < dimensions.size(); ++d) {
             const Element* grid = child(parts[d].major, "gridline");
@@ -169,14 +204,34 @@ void drawCoordinates(const Page& page, const Element* graph, const Element* coor
                 canvas.line(a, b, gs);
             }
         }
+}
+
+void drawMarks(Prepared& p) {
+    Canvas& canvas = p.plot.canvas;
+    Plot& plot = p.plot;
+    // Reference rectangles lie behind the data unless they ask to be in front.
+    std::vector<const Element*> marks = p.marks;
+    std::stable_partition(marks.begin(), marks.end(), [](const Element* m) {
+        return nameOf(m) == "rectangleGuide" && number(m, "zOrder", 0) <= 0;
+    });
     canvas.pushClip(Rect{plot.area.x - 0.5 * plot.area.w, plot.area.y - 0.5 * plot.area.h, plot.area.w * 2,
                          plot.area.h * 2});
     for (const Element* m : marks)
         drawMark(plot, m);
     canvas.pop();
+}
 
-    if (plot.polar || !axes)
+void drawAxes(const Page& page, Prepared& set) {
+    if (set.plot.polar)
         return;
+    Canvas& canvas = page.canvas;
+    Plot& plot = set.plot;
+    const auto& dimensions = set.dimensions;
+    const double unit = canvas.unit();
+    const bool xOnLeft = plot.transposed;
+    const auto& parts = set.parts;
+    const auto& ticks = set.ticks;
+    const auto& labelStyles = set.labelStyles;
     for (std::size_t d = 0; d < 2 && d < dimensions.size(); ++d) {
         const AxisParts& p = parts[d];
         Style axisStyle = page.styles.resolve(p.axis, "style", page.styles.chart());
@@ -246,6 +301,45 @@ void drawCoordinates(const Page& page, const Element* graph, const Element* coor
     }
 }
 
+} // namespace
+
+void drawCoordinates(const Page& page, const Element* graph, const Element* coordinates, const Rect& cell,
+                     const std::vector<bool>& rowFilter, bool axes, int index) {
+    Prepared p = prepare(page, graph, coordinates, cell, rowFilter, axes, index);
+    p.plot.area = areaWithin(cell, p.leftRoom, p.rightRoom, p.topRoom, p.bottomRoom);
+    setUpDepth(p.plot);
+    drawGrid(page, p);
+    drawMarks(p);
+    if (axes)
+        drawAxes(page, p);
+}
+
+void drawCoordinateSets(const Page& page, const Element* graph, const Rect& cell,
+                        const std::vector<bool>& rowFilter, bool axes) {
+    const auto coordinates = children(graph, "coordinates");
+    std::vector<Prepared> sets;
+    double left = 0, right = 0, top = 0, bottom = 0;
+    for (std::size_t i = 0; i < coordinates.size() && i < 8; ++i) {
+        sets.push_back(prepare(page, graph, coordinates[i], cell, rowFilter, axes, static_cast<int>(i)));
+        left = std::max(left, sets.back().leftRoom);
+        right = std::max(right, sets.back().rightRoom);
+        top = std::max(top, sets.back().topRoom);
+        bottom = std::max(bottom, sets.back().bottomRoom);
+    }
+    // Every set shares the one data area, so a second y axis measures the same bars and lines.
+    for (Prepared& p : sets) {
+        p.plot.area = areaWithin(cell, left, right, top, bottom);
+        setUpDepth(p.plot);
+    }
+    for (Prepared& p : sets)
+        drawGrid(page, p);
+    for (Prepared& p : sets)
+        drawMarks(p);
+    if (axes)
+        for (Prepared& p : sets)
+            drawAxes(page, p);
+}
+
 void drawGraph(const Page& page, const Element* graph, const Rect& frame) {
     Canvas& canvas = page.canvas;
     const Style graphStyle = page.styles.resolve(graph, "style", page.styles.chart());
@@ -255,9 +349,7 @@ void drawGraph(const Page& page, const Element* graph, const Rect& frame) {
     const Rect inner{frame.x + pad, frame.y + pad, std::max(1.0, frame.w - 2 * pad),
                      std::max(1.0, frame.h - 2 * pad)};
     canvas.rect(frame, graphStyle, true, false);
-    const auto coordinates = children(graph, "coordinates");
-    for (std::size_t i = 0; i < coordinates.size() && i < 8; ++i)
-        drawCoordinates(page, graph, coordinates[i], inner, {}, true, static_cast<int>(i));
+    drawCoordinateSets(page, graph, inner, {}, true);
 }
 
 } // namespace plotaid::render

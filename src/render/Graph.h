@@ -20,6 +20,11 @@ void drawGraph(const Page& page, const Element* graph, const Rect& frame);
 void drawCoordinates(const Page& page, const Element* graph, const Element* coordinates, const Rect& cell,
                      const std::vector<bool>& rowFilter, bool axes, int index);
 
+// Every set of coordinates of a graph drawn into `cell`, sharing one data area: the room each set's
+// axes need is taken on every set, so bars and a line over a second y axis line up.
+void drawCoordinateSets(const Page& page, const Element* graph, const Rect& cell,
+                        const std::vector<bool>& rowFilter, bool axes);
+
 // Nice tick values between lo and hi: `delta` apart when positive, else about `count` of them.
 std::vector<double> niceTicks(double lo, double hi, double delta, int count);
 

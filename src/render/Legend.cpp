@@ -43,6 +43,14 @@ Metrics metricsOf(const Page& page, const Element* legend) {
     return m;
 }
 
+// Line swatches are wide enough to show a dash and its gap; texts line up after the widest.
+double swatchWidth(const Metrics& m, const std::vector<LegendEntry>& entries) {
+    for (const LegendEntry& e : entries)
+        if (e.markName == "line")
+            return 3 * m.swatch;
+    return m.swatch;
+}
+
 } // namespace
 
 std::vector<LegendEntry> legendEntries(const Page& page, const Element* legend) {
@@ -50,6 +58,15 @@ std::vector<LegendEntry> legendEntries(const Page& page, const Element* legend) 
     std::set<std::string> seen;
     for (const Element* target : children(legend, "legendTarget")) {
         const Element* aesthetic = byId(legend, attr(target, "target"));
+        // A mark as the target is one entry: its name, else its variable's label.
+        if (aesthetic && markKind(nameOf(aesthetic)) && out.size() < kMaxEntries) {
+            const Column* c = page.data.variable(attr(target, "variable"));
+            std::string text = attr(aesthetic, "name");
+            if (text.empty() && c)
+                text = c->label;
+            out.push_back({text, page.styles.resolve(aesthetic, "style"), nameOf(aesthetic)});
+            continue;
+        }
         const Element* mark = markOf(aesthetic);
         if (aesthetic == nullptr || mark == nullptr || markKind(nameOf(mark)) == nullptr)
             continue;
@@ -77,9 +94,11 @@ std::vector<LegendEntry> legendEntries(const Page& page, const Element* legend) 
 TextSize legendSize(const Page& page, const Element* legend) {
     const Metrics m = metricsOf(page, legend);
     double w = page.canvas.measure(textOf(child(legend, "label")), m.title).w, h = m.titleH;
-    for (const LegendEntry& e : legendEntries(page, legend)) {
+    const auto entries = legendEntries(page, legend);
+    const double swatchW = swatchWidth(m, entries);
+    for (const LegendEntry& e : entries) {
         const TextSize t = page.canvas.measure(e.text, m.text);
-        w = std::max(w, m.swatch + m.gap + t.w);
+        w = std::max(w, swatchW + m.gap + t.w);
         h += std::max(m.swatch, t.h) + m.gap;
     }
     return {w + 2 * m.pad, h + 2 * m.pad};
@@ -95,18 +114,27 @@ void drawLegend(const Page& page, const Element* legend, const Rect& at) {
     if (m.titleH > 0)
         page.canvas.text(textOf(child(legend, "label")), {at.x + m.pad, y}, m.title);
     y += m.titleH;
-    for (const LegendEntry& e : legendEntries(page, legend)) {
+    const auto entries = legendEntries(page, legend);
+    const double swatchW = swatchWidth(m, entries);
+    for (const LegendEntry& e : entries) {
         const double rowH = std::max(m.swatch, page.canvas.measure(e.text, m.text).h);
-        const Rect box{at.x + m.pad, y + (rowH - m.swatch) / 2, m.swatch, m.swatch};
+        const Rect box{at.x + m.pad, y + (rowH - m.swatch) / 2, e.markName == "line" ? swatchW : m.swatch,
+                       m.swatch};
         if (e.markName == "line") {
-            Style stroke = e.style;
+            const Style stroke = lineStroke(e.style);
             page.canvas.line({box.x, box.y + box.h / 2}, {box.right(), box.y + box.h / 2}, stroke);
+            if (stroke.symbol && *stroke.symbol != "none") {
+                Style marker = stroke;
+                if (!marker.color || marker.color->a == 0)
+                    marker.color = stroke.color2;
+                page.canvas.symbol({box.x + box.w / 2, box.y + box.h / 2}, marker);
+            }
         } else if (e.markName == "point") {
             page.canvas.symbol({box.x + box.w / 2, box.y + box.h / 2}, e.style);
         } else {
             page.canvas.rect(box, e.style);
         }
-        page.canvas.text(e.text, {box.right() + m.gap, y + rowH / 2}, m.text, 0, 0.5);
+        page.canvas.text(e.text, {at.x + m.pad + swatchW + m.gap, y + rowH / 2}, m.text, 0, 0.5);
         y += rowH + m.gap;
     }
 }

@@ -141,7 +141,8 @@ Style Plot::cycleStyle(const std::string& cycleId, std::size_t index) const {
 
 Style Plot::rowStyle(const Element* mark, std::size_t row, const char* styleAttribute) const {
     Style s = styles.resolve(mark, styleAttribute);
-    static const char* const kAesthetics[] = {"color", "shape", "size", "dash", "pattern", "transparency"};
+    static const char* const kAesthetics[] = {"color", "shape", "size", "dash", "pattern", "transparency",
+                                              "styleBy"};
     for (const char* kind : kAesthetics)
         for (const Element* a : children(mark, kind)) {
             const std::string variable = attr(a, "variable");
@@ -181,6 +182,12 @@ Style Plot::rowStyle(const Element* mark, std::size_t row, const char* styleAttr
                 s = keep;
             }
         }
+    return s;
+}
+
+Style lineStroke(Style s) {
+    if (!s.color2 || s.color2->a == 0)
+        s.color2 = s.color;
     return s;
 }
 

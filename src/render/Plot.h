@@ -99,6 +99,10 @@ struct Plot {
     Style cycleStyle(const std::string& cycleId, std::size_t index) const;
 };
 
+// A line (mark or guide) strokes in its secondary colour, or in its main colour where the style
+// gives no secondary one: templates write a line's stroke as its main colour.
+Style lineStroke(Style s);
+
 // A statistic over values: "method" as charts write it (1 count, 2 mean, 3 percent of the total,
 // 4 sum, 5 median, 6 minimum/maximum are read by error bars, 10 count in a bin).
 double statistic(int method, const std::vector<double>& values, double total);

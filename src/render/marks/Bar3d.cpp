@@ -63,10 +63,12 @@ void draw(Plot& plot, const Element* mark) {
     for (const Bar& b : bars) {
         const Summary& s = *b.s;
         const Style style = plot.rowStyle(mark, s.firstRow);
-        const double width = style.width && style.width->percent ? std::clamp(style.width->value / 100, 0.0, 1.0) : 0.6;
+        const double width =
+            style.width && style.width->percent ? std::clamp(style.width->value / 100, 0.0, 1.0) : 0.6;
         // Clusters share the band only when z does not already set them apart.
-        const Slot slot = z ? Slot{sx.categorical ? sx.atCategory(s.xIndex) : sx.at(s.x), sx.categorical ? sx.band() : 0.02}
-                            : slotOf(plot, g, s);
+        const Slot slot =
+            z ? Slot{sx.categorical ? sx.atCategory(s.xIndex) : sx.at(s.x), sx.categorical ? sx.band() : 0.02}
+              : slotOf(plot, g, s);
         const double x0 = slot.centre - slot.band * width / 2, x1 = slot.centre + slot.band * width / 2;
         const double z0 = b.zCentre - b.zBand * share / 2, z1 = b.zCentre + b.zBand * share / 2;
         const double y0 = sy.at(std::min(0.0, s.y)), y1 = sy.at(std::max(0.0, s.y));
@@ -77,8 +79,9 @@ void draw(Plot& plot, const Element* mark) {
         plot.canvas.polygon({at3(plot, xSide, y0, z0), at3(plot, xSide, y1, z0), at3(plot, xSide, y1, z1),
                              at3(plot, xSide, y0, z1)},
                             shaded(style, 0.65));
-        plot.canvas.polygon({at3(plot, x0, y0, z0), at3(plot, x1, y0, z0), at3(plot, x1, y1, z0), at3(plot, x0, y1, z0)},
-                            style);
+        plot.canvas.polygon(
+            {at3(plot, x0, y0, z0), at3(plot, x1, y0, z0), at3(plot, x1, y1, z0), at3(plot, x0, y1, z0)},
+            style);
     }
 }
 

@@ -58,14 +58,14 @@ void draw(Plot& plot, const Element* mark) {
         if (!style.color2 || style.color2->a == 0)
             style.color2 = style.color;
         const Slot slot = slotOf(plot, g, s);
-        const double width = style.width && style.width->percent ? std::clamp(style.width->value / 100, 0.0, 1.0)
-                                                                  : 0.3;
+        const double width =
+            style.width && style.width->percent ? std::clamp(style.width->value / 100, 0.0, 1.0) : 0.3;
         const double half = slot.band * width / 2;
         plot.canvas.line(plot.at(slot.centre, sy.at(r.lo)), plot.at(slot.centre, sy.at(r.hi)), style);
         if (style.symbol.value_or("ibeam") == "ibeam")
             for (double end : {r.lo, r.hi})
-                plot.canvas.line(plot.at(slot.centre - half, sy.at(end)), plot.at(slot.centre + half, sy.at(end)),
-                                 style);
+                plot.canvas.line(plot.at(slot.centre - half, sy.at(end)),
+                                 plot.at(slot.centre + half, sy.at(end)), style);
     }
 }
 

@@ -29,6 +29,26 @@ int methodOf(const Element* mark, int fallback) {
     return s ? static_cast<int>(number(s, "method", fallback)) : fallback;
 }
 
+double centreOf(const Plot& plot, const Grouping& g, const Summary& s, double* band) {
+    const Scale& sx = plot.dims[0];
+    double centre = sx.categorical ? sx.atCategory(s.xIndex) : sx.at(s.x);
+    double width = sx.categorical ? sx.band() : 0.02;
+    if (hasAttr(sx.dimension, "clusterVariable") && g.split != nullptr) {
+        width /= static_cast<double>(g.splits);
+        centre += (static_cast<double>(s.splitIndex) - (static_cast<double>(g.splits) - 1) / 2.0) * width;
+    }
+    if (band)
+        *band = width;
+    return centre;
+}
+
+std::size_t rowsIn(const Grouping& g) {
+    std::size_t n = 0;
+    for (const Summary& s : g.summaries)
+        n += s.rows.size();
+    return n;
+}
+
 Grouping group(const Plot& plot, const Element* mark) {
     Grouping g;
     const Column* x = plot.columnOf(mark, "x");
@@ -88,6 +108,7 @@ Grouping group(const Plot& plot, const Element* mark) {
             g.summaries.push_back(s);
         }
         g.summaries[it->second].values.push_back(y && row < y->values.size() ? y->values[row] : 1);
+        g.summaries[it->second].rows.push_back(row);
     }
     for (Summary& s : g.summaries)
         s.y = statistic(method, s.values, static_cast<double>(shown));
@@ -99,7 +120,8 @@ Slot slotOf(const Plot& plot, const Grouping& g, const Summary& s) {
     Slot slot{sx.categorical ? sx.atCategory(s.xIndex) : sx.at(s.x), sx.categorical ? sx.band() : 0.02};
     if (hasAttr(sx.dimension, "clusterVariable") && g.split != nullptr && g.splits > 1) {
         slot.band /= static_cast<double>(g.splits);
-        slot.centre += (static_cast<double>(s.splitIndex) - static_cast<double>(g.splits - 1) / 2.0) * slot.band;
+        slot.centre +=
+            (static_cast<double>(s.splitIndex) - static_cast<double>(g.splits - 1) / 2.0) * slot.band;
     }
     return slot;
 }

@@ -8,12 +8,13 @@
 namespace plotaid::render {
 
 struct Summary {
-    std::size_t xIndex = 0;     // category of x (categorical x) ...
-    double x = NAN;             // ... or the x value (continuous x)
-    std::size_t splitIndex = 0; // category of the split variable, 0 without one
-    double y = NAN;             // the statistic
-    std::size_t firstRow = 0;   // a row of the group, for its style
-    std::vector<double> values; // the y values of the group's rows
+    std::size_t xIndex = 0;        // category of x (categorical x) ...
+    double x = NAN;                // ... or the x value (continuous x)
+    std::size_t splitIndex = 0;    // category of the split variable, 0 without one
+    double y = NAN;                // the statistic
+    std::size_t firstRow = 0;      // a row of the group, for its style
+    std::vector<double> values;    // the y values of the group's rows
+    std::vector<std::size_t> rows; // the group's rows, for labels
 };
 
 struct Grouping {
@@ -28,6 +29,11 @@ struct Grouping {
 std::string splitVariableOf(const Plot& plot, const Element* mark, std::string* domain = nullptr);
 // The summary method of a mark (its summaryStatistic child), `fallback` without one.
 int methodOf(const Element* mark, int fallback);
+// The x fraction of a summary's centre: its category's band, moved aside within the band when the
+// x dimension clusters by the split variable; `band` receives the width the item may take.
+double centreOf(const Plot& plot, const Grouping& g, const Summary& s, double* band = nullptr);
+// The rows of the summaries together: what percent labels count against.
+std::size_t rowsIn(const Grouping& g);
 // Groups the shown rows of `mark` by x and split, applying its statistic.
 Grouping group(const Plot& plot, const Element* mark);
 

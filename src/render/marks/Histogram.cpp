@@ -87,7 +87,8 @@ void measure(Plot& plot, const Element* mark) {
 void draw(Plot& plot, const Element* mark) {
     const Bins b = binsOf(plot, mark);
     const Style style = plot.styles.resolve(mark);
-    const double width = style.width && style.width->percent ? std::clamp(style.width->value / 100, 0.0, 1.0) : 1.0;
+    const double width =
+        style.width && style.width->percent ? std::clamp(style.width->value / 100, 0.0, 1.0) : 1.0;
     const Scale &sx = plot.dims[0], &sy = plot.dims[1];
     for (std::size_t i = 0; i < b.counts.size(); ++i) {
         if (b.counts[i] <= 0)
@@ -96,8 +97,8 @@ void draw(Plot& plot, const Element* mark) {
         const double inset = b.width * (1 - width) / 2;
         const Point p = plot.at(sx.at(left + inset), sy.at(0));
         const Point q = plot.at(sx.at(left + b.width - inset), sy.at(b.counts[i]));
-        plot.canvas.rect(Rect{std::min(p.x, q.x), std::min(p.y, q.y), std::fabs(q.x - p.x), std::fabs(q.y - p.y)},
-                         style);
+        plot.canvas.rect(
+            Rect{std::min(p.x, q.x), std::min(p.y, q.y), std::fabs(q.x - p.x), std::fabs(q.y - p.y)}, style);
     }
 }
 
@@ -113,7 +114,8 @@ struct Curve {
 
 bool isDistribution(const Plot& plot, const Element* mark) {
     const Column* x = plot.columnOf(mark, "x");
-    return x && !x->categorical && !plot.polar && attr(child(mark, "distributionStatistic"), "distribution") == "normal";
+    return x && !x->categorical && !plot.polar &&
+           attr(child(mark, "distributionStatistic"), "distribution") == "normal";
 }
 
 Curve curveOf(const Plot& plot, const Element* mark) {
@@ -130,8 +132,8 @@ Curve curveOf(const Plot& plot, const Element* mark) {
     const std::string variable = attr(child(mark, "x"), "variable");
     double width = 0;
     for (const Element* other : children(plot.graph, "interval"))
-        if (attr(child(other, "x"), "variable") == variable && attr(other, "coordinates") == attr(mark, "coordinates") &&
-            isHistogram(plot, other)) {
+        if (attr(child(other, "x"), "variable") == variable &&
+            attr(other, "coordinates") == attr(mark, "coordinates") && isHistogram(plot, other)) {
             width = binsOf(plot, other).width;
             break;
         }

@@ -1,5 +1,6 @@
 // Bars: simple, clustered (the x dimension's cluster variable) and stacked (position modifier 3).
 #include "render/marks/Groups.h"
+#include "render/marks/Labels.h"
 
 #include <map>
 
@@ -50,6 +51,7 @@ void draw(Plot& plot, const Element* mark) {
         const Point b = plot.at(centre + half, sy.at(to));
         plot.canvas.rect(
             Rect{std::min(a.x, b.x), std::min(a.y, b.y), std::fabs(b.x - a.x), std::fabs(b.y - a.y)}, style);
+        drawLabels(plot, mark, s.rows, rowsIn(g), plot.at(centre, sy.at(from)), plot.at(centre, sy.at(to)));
     }
 }
 

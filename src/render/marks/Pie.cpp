@@ -102,7 +102,8 @@ void draw(Plot& plot, const Element* mark) {
             const double r = outer * 1.08;
             plot.canvas.line({c.x + dx * outer * 0.95, c.y + dy * outer * 0.95}, {c.x + dx * r, c.y + dy * r},
                              labelStyle);
-            plot.canvas.text(text, {c.x + dx * r * 1.02, c.y + dy * r * 1.02}, labelStyle, dx < 0 ? 1 : 0, 0.5);
+            plot.canvas.text(text, {c.x + dx * r * 1.02, c.y + dy * r * 1.02}, labelStyle, dx < 0 ? 1 : 0,
+                             0.5);
         } else {
             const double r = (inner + outer) / 2 + (inner > 0 ? 0 : outer * 0.15);
             plot.canvas.text(text, {c.x + dx * r, c.y + dy * r}, labelStyle, 0.5, 0.5);

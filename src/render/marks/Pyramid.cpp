@@ -35,12 +35,13 @@ void draw(Plot& plot, const Element* mark) {
         if (!std::isfinite(s.y) || !sx.categorical)
             continue;
         const Style style = plot.rowStyle(mark, s.firstRow);
-        const double width = style.width && style.width->percent ? std::clamp(style.width->value / 100, 0.0, 1.0) : 0.9;
+        const double width =
+            style.width && style.width->percent ? std::clamp(style.width->value / 100, 0.0, 1.0) : 0.9;
         const double half = sx.band() * width / 2, centre = sx.atCategory(s.xIndex);
         const Point a = plot.at(centre - half, sy.at(0));
         const Point b = plot.at(centre + half, sy.at(sideOf(plot, s.splitIndex) * std::fabs(s.y)));
-        plot.canvas.rect(Rect{std::min(a.x, b.x), std::min(a.y, b.y), std::fabs(b.x - a.x), std::fabs(b.y - a.y)},
-                         style);
+        plot.canvas.rect(
+            Rect{std::min(a.x, b.x), std::min(a.y, b.y), std::fabs(b.x - a.x), std::fabs(b.y - a.y)}, style);
     }
 }
 

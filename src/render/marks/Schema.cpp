@@ -104,7 +104,8 @@ void draw(Plot& plot, const Element* mark) {
             canvas.line(at(-cap, end), at(cap, end), fence);
         }
         const Point p = at(-half, b.q1), q = at(half, b.q3);
-        canvas.rect(Rect{std::min(p.x, q.x), std::min(p.y, q.y), std::fabs(q.x - p.x), std::fabs(q.y - p.y)}, box);
+        canvas.rect(Rect{std::min(p.x, q.x), std::min(p.y, q.y), std::fabs(q.x - p.x), std::fabs(q.y - p.y)},
+                    box);
         canvas.line(at(-half, b.q1), at(half, b.q1), hinge);
         canvas.line(at(-half, b.q3), at(half, b.q3), hinge);
         canvas.line(at(-half, b.median), at(half, b.median), median);
@@ -113,9 +114,10 @@ void draw(Plot& plot, const Element* mark) {
                 const Point c = at(0, value);
                 canvas.symbol(c, list == &b.outliers ? outlier : extreme);
                 if (labels && row < labels->text.size()) {
-                    const std::string text = labels->categorical || std::isnan(labels->values[row])
-                                                 ? labels->text[row]
-                                                 : formatNumber(labels->values[row], child(labeling, "format"));
+                    const std::string text =
+                        labels->categorical || std::isnan(labels->values[row])
+                            ? labels->text[row]
+                            : formatNumber(labels->values[row], child(labeling, "format"));
                     canvas.text(text, {c.x + 4 * canvas.unit(), c.y}, labelStyle, 0, 0.5);
                 }
             }

@@ -51,10 +51,10 @@ double normalQuantile(double p) {
     if (!(p > 0 && p < 1))
         return NAN;
     // Acklam's rational approximation, good to about 1e-9.
-    static const double a[] = {-3.969683028665376e+01, 2.209460984245205e+02, -2.759285104469687e+02,
+    static const double a[] = {-3.969683028665376e+01, 2.209460984245205e+02,  -2.759285104469687e+02,
                                1.383577518672690e+02,  -3.066479806614716e+01, 2.506628277459239e+00};
     static const double b[] = {-5.447609879822406e+01, 1.615858368580409e+02, -1.556989798598866e+02,
-                               6.680131188771972e+01,  -1.328068155288572e+01};
+                               6.680131188771972e+01, -1.328068155288572e+01};
     static const double c[] = {-7.784894002430293e-03, -3.223964580411365e-01, -2.400758277161838e+00,
                                -2.549732539343734e+00, 4.374664141464968e+00,  2.938163982698783e+00};
     static const double d[] = {7.784695709041462e-03, 3.224671290700398e-01, 2.445134137142996e+00,
@@ -85,6 +85,14 @@ double tQuantile(double p, double df) {
     const double g3 = (((3 * z2 + 19) * z2 + 17) * z2 - 15) * z / 384;
     const double g4 = ((((79 * z2 + 776) * z2 + 1482) * z2 - 1920) * z2 - 945) * z / 92160;
     return z + g1 / df + g2 / (df * df) + g3 / (df * df * df) + g4 / (df * df * df * df);
+}
+
+double tCritical(double level, double df) {
+    if (!std::isfinite(level))
+        level = 0.95;
+    level = std::clamp(level < 0.5 ? 1 - level : level, 0.5, 0.9999);
+    const double p = 0.5 + level / 2;
+    return df >= 1 ? tQuantile(p, df) : normalQuantile(p);
 }
 
 } // namespace plotaid::render

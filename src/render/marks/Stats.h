@@ -16,6 +16,9 @@ double standardDeviation(const std::vector<double>& values);
 // Quantiles of the standard normal and of Student's t with `df` degrees of freedom.
 double normalQuantile(double p);
 double tQuantile(double p, double df);
+// The two-sided critical value at a confidence level (0.95 and 0.05 both mean 95%); the normal
+// one when there are no degrees of freedom to speak of.
+double tCritical(double level, double df);
 
 } // namespace plotaid::render
 
