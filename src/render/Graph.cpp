@@ -1,5 +1,7 @@
 #include "render/Graph.h"
 
+#include "render/Facets.h"
+
 #include <algorithm>
 #include <cmath>
 
@@ -82,10 +84,12 @@ void drawCoordinates(const Page& page, const Element* graph, const Element* coor
     Canvas& canvas = page.canvas;
     const double unit = canvas.unit();
     Plot plot{canvas, page.styles, page.data, graph, coordinates, cell,
-              {},     false,       false,     false, 0,           rowFilter};
+              {},     false,       false,     false, 0,           rowFilter, {}};
     plot.transposed = child(coordinates, "transposeTransform") != nullptr;
     plot.polar = child(coordinates, "polarTransform") != nullptr;
     plot.reflected = child(coordinates, "reflectionTransform") != nullptr;
+    if (page.cell)
+        page.cell->enter(plot);
     const auto dimensions = children(coordinates, "dimension");
     const auto marks = marksOf(graph, coordinates, index == 0);
 
@@ -118,6 +122,8 @@ void drawCoordinates(const Page& page, const Element* graph, const Element* coor
         bars = bars || nameOf(m) == "interval" || nameOf(m) == "area";
         markKind(nameOf(m))->measure(plot, m);
     }
+    if (page.cell)
+        page.cell->share(plot);
     for (std::size_t d = 0; d < 3; ++d)
         plot.dims[d].settle(bars && d == 1);
 
@@ -150,6 +156,8 @@ void drawCoordinates(const Page& page, const Element* graph, const Element* coor
             double& side = vertical ? (opposite ? rightRoom : leftRoom) : (opposite ? topRoom : bottomRoom);
             side = std::max(side, room);
         }
+    if (page.cell && !page.cell->fit(leftRoom, bottomRoom, rightRoom, topRoom))
+        return;
     plot.area = Rect{cell.x + leftRoom, cell.y + topRoom, std::max(1.0, cell.w - leftRoom - rightRoom),
                      std::max(1.0, cell.h - topRoom - bottomRoom)};
 
@@ -181,6 +189,8 @@ void drawCoordinates(const Page& page, const Element* graph, const Element* coor
             continue;
         const bool vertical = (d == 1) != xOnLeft;
         const bool opposite = flag(p.axis, "opposite", false);
+        if (page.cell && !page.cell->paints(vertical, opposite))
+            continue;
         // The axis line runs along the data area's edge.
         const Point a = vertical ? Point{opposite ? plot.area.right() : plot.area.x, plot.area.bottom()}
                                  : Point{plot.area.x, opposite ? plot.area.y : plot.area.bottom()};
@@ -252,6 +262,8 @@ void drawGraph(const Page& page, const Element* graph, const Rect& frame) {
     const Rect inner{frame.x + pad, frame.y + pad, std::max(1.0, frame.w - 2 * pad),
                      std::max(1.0, frame.h - 2 * pad)};
     canvas.rect(frame, graphStyle, true, false);
+    if (drawFacets(page, graph, inner))
+        return;
     const auto coordinates = children(graph, "coordinates");
     for (std::size_t i = 0; i < coordinates.size() && i < 8; ++i)
         drawCoordinates(page, graph, coordinates[i], inner, {}, true, static_cast<int>(i));

@@ -85,6 +85,9 @@ Point Plot::at(double fx, double fy) const {
 
 const Column* Plot::columnOf(const Element* mark, const char* role) const {
     const Element* c = child(mark, role);
+    const int d = std::string(role) == "x" ? 0 : std::string(role) == "y" ? 1 : -1;
+    if (c && d >= 0 && panel.column[d] && attr(c, "variable") == panel.variable[d])
+        return panel.column[d];
     return c ? data.variable(attr(c, "variable")) : nullptr;
 }
 
@@ -138,6 +141,9 @@ Style Plot::rowStyle(const Element* mark, std::size_t row, const char* styleAttr
                 s = keep;
             }
         }
+    for (const Element* c : children(mark, "conditionalStyle"))
+        if (conditionHolds(attr(c, "when"), panel.facet))
+            s = styles.resolve(c, "style", s);
     return s;
 }
 
