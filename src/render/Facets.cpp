@@ -37,11 +37,13 @@ struct Grid {
     Labels labels[2];
 };
 
-double gapOf(const Element* level, double extent, double unit) {
+// The room between panels, at most half the extent in all.
+double gapOf(const Element* level, double extent, double unit, std::size_t panels) {
     Length l;
-    if (!parseLength(attr(level, "gap"), l) || !std::isfinite(l.value) || l.value < 0)
+    if (panels < 2 || !parseLength(attr(level, "gap"), l) || !std::isfinite(l.value) || l.value < 0)
         return 0;
-    return l.percent ? l.value / 100 * extent : l.value * unit;
+    return std::min(l.percent ? l.value / 100 * extent : l.value * unit,
+                    extent / 2 / static_cast<double>(panels - 1));
 }
 
 Grid gridOf(const Page& page, const Element* graph, const Element* layout, const Rect& inner) {
@@ -93,13 +95,8 @@ Grid gridOf(const Page& page, const Element* graph, const Element* layout, const
     }
     g.rows = std::min(g.rows, std::max<std::size_t>(1, kMaxCells / g.columns));
     g.count = g.wrapped ? g.categories[0].size() : g.columns * g.rows;
-    g.gap[0] = gapOf(g.level[0], inner.w, page.canvas.unit());
-    g.gap[1] = gapOf(g.level[1] ? g.level[1] : g.level[0], inner.h, page.canvas.unit());
-    for (int d = 0; d < 2; ++d) {
-        const std::size_t n = d ? g.rows : g.columns;
-        if (n > 1)
-            g.gap[d] = std::min(g.gap[d], (d ? inner.h : inner.w) / 2 / static_cast<double>(n - 1));
-    }
+    g.gap[0] = gapOf(g.level[0], inner.w, page.canvas.unit(), g.columns);
+    g.gap[1] = gapOf(g.level[1] ? g.level[1] : g.level[0], inner.h, page.canvas.unit(), g.rows);
 
     // Labels in the facet axis' style: categories by the ticks' style on a strip of the axis'
     // fill; a matrix names each column with its own axis' label.
@@ -268,7 +265,8 @@ bool drawFacets(const Page& page, const Element* graph, const Rect& inner) {
         for (std::size_t j = i - i % g.count; j < i - i % g.count + g.count; ++j)
             for (int d = 0; d < 3; ++d) {
                 const std::size_t p = i % g.count, q = j % g.count;
-                if (g.matrix && ((d == 0 && p % g.columns != q % g.columns) || (d == 1 && p / g.columns != q / g.columns)))
+                if (g.matrix && ((d == 0 && p % g.columns != q % g.columns) ||
+                                 (d == 1 && p / g.columns != q / g.columns)))
                     continue;
                 Cell& to = cells[i];
                 for (double v : {cells[j].ownLo[d], cells[j].ownHi[d]})
@@ -311,7 +309,8 @@ bool drawFacets(const Page& page, const Element* graph, const Rect& inner) {
         if (g.wrapped)
             drawStrip(canvas, across, p, Rect{slot.x, slot.y, slot.w, strip}, false);
         if (!g.wrapped && r == 0)
-            drawStrip(canvas, across, c, Rect{slot.x, inner.y + across.titleSize, slot.w, across.strip}, false);
+            drawStrip(canvas, across, c, Rect{slot.x, inner.y + across.titleSize, slot.w, across.strip},
+                      false);
         if (c + 1 == g.columns)
             drawStrip(canvas, down, r, Rect{inner.right() - right, slot.y, down.strip, slot.h}, true);
     }
