@@ -304,6 +304,9 @@ bool drawFacets(const Page& page, const Element* graph, const Rect& inner) {
             Page sub = page;
             sub.cell = &cells[k * g.count + p];
             sub.cell->measuring = false;
+            sub.cell->grid = grid;
+            sub.cell->titles[0] = c == 0 && r + 1 == g.rows;
+            sub.cell->titles[1] = c == 0 && r == 0;
             drawCoordinates(sub, graph, coordinates[k], area, rows[p], true, static_cast<int>(k));
         }
         if (g.wrapped)

@@ -22,6 +22,8 @@ struct Cell {
     double sharedLo[3] = {NAN, NAN, NAN}, sharedHi[3] = {NAN, NAN, NAN};
     double ownLo[3] = {NAN, NAN, NAN}, ownHi[3] = {NAN, NAN, NAN};
     double room[4] = {}; // left, bottom, right, top, as measured
+    Rect grid;           // all the panels: one title serves each side
+    bool titles[2] = {}; // the panel writes the axis title along x, along y
 
     // Gives the plot the panel's place and matrix columns.
     void enter(Plot& plot) const;
@@ -32,6 +34,8 @@ struct Cell {
     bool fit(double& left, double& bottom, double& right, double& top);
     // Whether the panel paints the axis on that side.
     bool paints(bool vertical, bool opposite) const;
+    // Where the axis title centres: the whole grid for the one panel that writes it, else empty.
+    Rect titleSpan(bool vertical) const { return titles[vertical] ? grid : Rect{}; }
 };
 
 // Draws a graph that has a facet layout as its grid of panels within `inner`; false when the

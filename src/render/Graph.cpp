@@ -242,12 +242,13 @@ void drawCoordinates(const Page& page, const Element* graph, const Element* coor
         const Element* label = child(p.axis, "label");
         const Style ls = page.styles.resolve(label, "style", page.styles.chart());
         const std::string text = textOf(label);
-        if (label && !text.empty()) {
+        const Rect span = page.cell ? page.cell->titleSpan(vertical) : plot.area;
+        if (label && !text.empty() && span.w > 0) {
             if (vertical)
-                canvas.text(text, {a.x + outward * (far + 2 * unit), plot.area.y + plot.area.h / 2}, ls, 0.5,
+                canvas.text(text, {a.x + outward * (far + 2 * unit), span.y + span.h / 2}, ls, 0.5,
                             opposite ? 0 : 1, 90);
             else
-                canvas.text(text, {plot.area.x + plot.area.w / 2, a.y - outward * (far + 2 * unit)}, ls, 0.5,
+                canvas.text(text, {span.x + span.w / 2, a.y - outward * (far + 2 * unit)}, ls, 0.5,
                             opposite ? 1 : 0);
         }
     }
