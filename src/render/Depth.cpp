@@ -5,7 +5,8 @@
 namespace plotaid::render {
 
 bool isThreeD(const Element* coordinates) {
-    return child(coordinates, "rectangularTransform") != nullptr || child(coordinates, "obliqueTransform") != nullptr;
+    return child(coordinates, "rectangularTransform") != nullptr ||
+           child(coordinates, "obliqueTransform") != nullptr;
 }
 
 void setUpDepth(Plot& plot) {
@@ -28,8 +29,10 @@ void setUpDepth(Plot& plot) {
     if (!std::isfinite(dx) || !std::isfinite(dy))
         return;
     plot.back = {dx, -dy};
-    const double w = std::max(1.0, plot.area.w - std::fabs(dx)), h = std::max(1.0, plot.area.h - std::fabs(dy));
-    plot.area = Rect{plot.area.x + (dx < 0 ? plot.area.w - w : 0), plot.area.y + (dy > 0 ? plot.area.h - h : 0), w, h};
+    const double w = std::max(1.0, plot.area.w - std::fabs(dx)),
+                 h = std::max(1.0, plot.area.h - std::fabs(dy));
+    plot.area = Rect{plot.area.x + (dx < 0 ? plot.area.w - w : 0),
+                     plot.area.y + (dy > 0 ? plot.area.h - h : 0), w, h};
 }
 
 Point at3(const Plot& plot, double fx, double fy, double fz) {

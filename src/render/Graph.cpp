@@ -1,6 +1,7 @@
 #include "render/Graph.h"
 
 #include "render/Depth.h"
+#include "render/Facets.h"
 
 #include <algorithm>
 #include <cmath>
@@ -108,12 +109,15 @@ Prepared prepare(const Page& page, const Element* graph, const Element* coordina
                            false,
                            0,
                            rowFilter,
+                           {},
                            {}},
                       children(coordinates, "dimension"), marksOf(graph, coordinates, index == 0)};
     Plot& plot = prepared.plot;
     plot.transposed = child(coordinates, "transposeTransform") != nullptr;
     plot.polar = child(coordinates, "polarTransform") != nullptr;
     plot.reflected = child(coordinates, "reflectionTransform") != nullptr;
+    if (page.cell)
+        page.cell->enter(plot);
     const auto& dimensions = prepared.dimensions;
     const auto& marks = prepared.marks;
     // Categorical dimensions take their categories from the domain or from the first mark
@@ -145,6 +149,8 @@ Prepared prepare(const Page& page, const Element* graph, const Element* coordina
         bars = bars || startsAtZero(plot, m);
         measureMark(plot, m);
     }
+    if (page.cell)
+        page.cell->share(plot);
     for (std::size_t d = 0; d < 3; ++d)
         plot.dims[d].settle(bars && d == 1);
 
@@ -239,6 +245,8 @@ void drawAxes(const Page& page, Prepared& set) {
             continue;
         const bool vertical = (d == 1) != xOnLeft;
         const bool opposite = flag(p.axis, "opposite", false);
+        if (page.cell && !page.cell->paints(vertical, opposite))
+            continue;
         // The axis line runs along the data area's edge.
         const Point a = vertical ? Point{opposite ? plot.area.right() : plot.area.x, plot.area.bottom()}
                                  : Point{plot.area.x, opposite ? plot.area.y : plot.area.bottom()};
@@ -290,12 +298,13 @@ void drawAxes(const Page& page, Prepared& set) {
         const Element* label = child(p.axis, "label");
         const Style ls = page.styles.resolve(label, "style", page.styles.chart());
         const std::string text = textOf(label);
-        if (label && !text.empty()) {
+        const Rect span = page.cell ? page.cell->titleSpan(vertical) : plot.area;
+        if (label && !text.empty() && span.w > 0) {
             if (vertical)
-                canvas.text(text, {a.x + outward * (far + 2 * unit), plot.area.y + plot.area.h / 2}, ls, 0.5,
+                canvas.text(text, {a.x + outward * (far + 2 * unit), span.y + span.h / 2}, ls, 0.5,
                             opposite ? 0 : 1, 90);
             else
-                canvas.text(text, {plot.area.x + plot.area.w / 2, a.y - outward * (far + 2 * unit)}, ls, 0.5,
+                canvas.text(text, {span.x + span.w / 2, a.y - outward * (far + 2 * unit)}, ls, 0.5,
                             opposite ? 1 : 0);
         }
     }
@@ -306,6 +315,9 @@ void drawAxes(const Page& page, Prepared& set) {
 void drawCoordinates(const Page& page, const Element* graph, const Element* coordinates, const Rect& cell,
                      const std::vector<bool>& rowFilter, bool axes, int index) {
     Prepared p = prepare(page, graph, coordinates, cell, rowFilter, axes, index);
+    // A panel's first pass only measures.
+    if (page.cell && !page.cell->fit(p.leftRoom, p.bottomRoom, p.rightRoom, p.topRoom))
+        return;
     p.plot.area = areaWithin(cell, p.leftRoom, p.rightRoom, p.topRoom, p.bottomRoom);
     setUpDepth(p.plot);
     drawGrid(page, p);
@@ -349,6 +361,8 @@ void drawGraph(const Page& page, const Element* graph, const Rect& frame) {
     const Rect inner{frame.x + pad, frame.y + pad, std::max(1.0, frame.w - 2 * pad),
                      std::max(1.0, frame.h - 2 * pad)};
     canvas.rect(frame, graphStyle, true, false);
+    if (drawFacets(page, graph, inner))
+        return;
     drawCoordinateSets(page, graph, inner, {}, true);
 }
 

@@ -6,10 +6,13 @@
 
 namespace plotaid::render {
 
+struct Cell;
+
 struct Page {
     Canvas& canvas;
     const StyleBook& styles;
     const ChartData& data;
+    Cell* cell = nullptr; // the panel being drawn, in a faceted graph
 };
 
 void drawGraph(const Page& page, const Element* graph, const Rect& frame);

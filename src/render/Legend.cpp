@@ -74,8 +74,8 @@ std::vector<LegendEntry> legendEntries(const Page& page, const Element* legend) 
         const Column* column = page.data.variable(variable);
         if (column == nullptr || !column->categorical)
             continue;
-        Plot plot{page.canvas, page.styles, page.data, graphOf(mark), nullptr, {},
-                  {},          false,       false,     false,         0,       {}, {}};
+        Plot plot{page.canvas, page.styles, page.data, graphOf(mark), nullptr, {}, {}, false, false, false, 0,
+                  {},          {},          {}};
         for (const std::string& category : page.data.categories(variable, attr(aesthetic, "domain"))) {
             if (out.size() >= kMaxEntries || !seen.insert(category).second)
                 continue;

@@ -128,6 +128,9 @@ Point Plot::at(double fx, double fy) const {
 
 const Column* Plot::columnOf(const Element* mark, const char* role) const {
     const Element* c = child(mark, role);
+    const int d = std::string(role) == "x" ? 0 : std::string(role) == "y" ? 1 : -1;
+    if (c && d >= 0 && panel.column[d] && attr(c, "variable") == panel.variable[d])
+        return panel.column[d];
     return c ? data.variable(attr(c, "variable")) : nullptr;
 }
 
@@ -141,8 +144,8 @@ Style Plot::cycleStyle(const std::string& cycleId, std::size_t index) const {
 
 Style Plot::rowStyle(const Element* mark, std::size_t row, const char* styleAttribute) const {
     Style s = styles.resolve(mark, styleAttribute);
-    static const char* const kAesthetics[] = {"color", "shape", "size", "dash", "pattern", "transparency",
-                                              "styleBy"};
+    static const char* const kAesthetics[] = {"color",   "shape",        "size",   "dash",
+                                              "pattern", "transparency", "styleBy"};
     for (const char* kind : kAesthetics)
         for (const Element* a : children(mark, kind)) {
             const std::string variable = attr(a, "variable");
@@ -182,6 +185,9 @@ Style Plot::rowStyle(const Element* mark, std::size_t row, const char* styleAttr
                 s = keep;
             }
         }
+    for (const Element* c : children(mark, "conditionalStyle"))
+        if (conditionHolds(attr(c, "when"), panel.facet))
+            s = styles.resolve(c, "style", s);
     return s;
 }
 

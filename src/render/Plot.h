@@ -83,6 +83,13 @@ struct Plot {
     // Rows of the data that this panel shows (empty: all rows).
     std::vector<bool> rowFilter;
     Point back; // 3-D: device offset from the front to the back plane
+    // A panel's place in its grid (facet1 the column, facet2 the row; -1 outside a grid) and, in a
+    // matrix, the column each of x and y stands for when a mark reads `variable`.
+    struct Panel {
+        int facet[2] = {-1, -1};
+        std::string variable[2];
+        const Column* column[2] = {nullptr, nullptr};
+    } panel;
 
     // Device position of the fractions fx (along x) and fy (along y, 0 at the bottom).
     Point at(double fx, double fy) const;
@@ -106,6 +113,10 @@ Style lineStroke(Style s);
 // A statistic over values: "method" as charts write it (1 count, 2 mean, 3 percent of the total,
 // 4 sum, 5 median, 6 minimum/maximum are read by error bars, 10 count in a bin).
 double statistic(int method, const std::vector<double>& values, double total);
+
+// Whether a conditional style's condition ("facet1==facet2", "facet1!=facet2") holds in the
+// panel at `facet`; conditions outside a grid or not understood do not hold.
+bool conditionHolds(const std::string& when, const int facet[2]);
 
 // Number text the way an axis or label <format> asks (prefix, suffix, grouping, fraction digits).
 std::string formatNumber(double value, const Element* format);

@@ -25,10 +25,11 @@ namespace {
 constexpr double kDesignWidth = 640;
 constexpr double kDesignHeight = 480;
 
-// Frames that have no location at all need a layout before they can be drawn.
+// Frames that have no location at all need a layout before they can be drawn. A container needs
+// none: the graphs in it are placed by their own.
 bool needsPacking(const Element* root) {
     for (const Element* f : framesOf(root))
-        if (child(f, "location") == nullptr)
+        if (nameOf(f) != "container" && child(f, "location") == nullptr)
             return true;
     return false;
 }

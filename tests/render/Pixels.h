@@ -62,6 +62,10 @@ public:
                 n += test(at(x, y)) ? 1 : 0;
         return n;
     }
+    bool near(int x, int y, const Rgb& c, int tolerance = 24) const { return at(x, y).near(c, tolerance); }
+    int count(int x0, int y0, int x1, int y1, const Rgb& c, int tolerance = 24) const {
+        return count(x0, y0, x1, y1, [&](const Rgb& p) { return p.near(c, tolerance); });
+    }
     int countNear(const Rgb& c, int tolerance = 24) const {
         return count(0, 0, width(), height(), [&](const Rgb& p) { return p.near(c, tolerance); });
     }

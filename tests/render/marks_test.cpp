@@ -34,7 +34,8 @@ Columns columnsOf(const Image& image, const Rgb& c, int tolerance = 40) {
     Columns out;
     int run = 0;
     for (int x = kX0; x < kX1; ++x) {
-        const bool hit = image.count(x, kY0, x + 1, kY1, [&](const Rgb& p) { return p.near(c, tolerance); }) > 0;
+        const bool hit =
+            image.count(x, kY0, x + 1, kY1, [&](const Rgb& p) { return p.near(c, tolerance); }) > 0;
         if (hit) {
             out.first = out.first < 0 ? x : out.first;
             out.last = x;
@@ -61,13 +62,15 @@ TEST(RenderMarks, LinePathsTakeTheirDashAndBreakAtMissingValues) {
         {lines, kBlue, 0, 15, 0, 3},     // North: solid, but for where other lines cross it
         {lines, kGreen, 60, 250, 4, 20}, // South: "6 3" leaves short gaps all along
         {noJune, kBlue, 50, 90, 50, 90}, // a missing June breaks North for two months
-        {edited(noJune, "breakRepresentation=\"gap\"", "breakRepresentation=\"interpolated\""), kBlue, 0, 15, 0, 3},
+        {edited(noJune, "breakRepresentation=\"gap\"", "breakRepresentation=\"interpolated\""), kBlue, 0, 15,
+         0, 3},
     };
     for (const Row& r : rows) {
         const Image image(drawnText(r.chart));
         ASSERT_TRUE(image.ok());
         const Columns c = columnsOf(image, r.colour);
-        SCOPED_TRACE(testing::Message() << c.first << ".." << c.last << " missing " << c.missing << " gap " << c.longestGap);
+        SCOPED_TRACE(testing::Message()
+                     << c.first << ".." << c.last << " missing " << c.missing << " gap " << c.longestGap);
         EXPECT_GT(c.last - c.first, 300); // Jan to Dec spans the data area
         EXPECT_GE(c.missing, r.minMissing);
         EXPECT_LE(c.missing, r.maxMissing);
@@ -108,10 +111,17 @@ TEST(RenderMarks, GuidesFromTemplatesTakeTheirStyleColour) {
         std::string instruction;
         int minPixels;
     } rows[] = {
-        {"line-series", R"(<addReferenceLine y="120"><style value="stroke:#FF00FF;stroke-width:2pt"/></addReferenceLine>)", 500},
-        {"line-series", R"(<addOriginLine y="100"><style value="stroke:#FF00FF;stroke-width:2pt"/></addOriginLine>)", 300},
-        {"scatter", R"(<addFitLine target="total" primary="true" type="linear"><style value="stroke:#FF00FF;stroke-width:2pt"/></addFitLine>)", 500},
-        {"simple-bar", R"(<addDataLabels labelLocationVertical="positive"><labeling variable="y"/><style color="#FF00FF" font-size="14pt"/></addDataLabels>)", 40},
+        {"line-series",
+         R"(<addReferenceLine y="120"><style value="stroke:#FF00FF;stroke-width:2pt"/></addReferenceLine>)",
+         500},
+        {"line-series",
+         R"(<addOriginLine y="100"><style value="stroke:#FF00FF;stroke-width:2pt"/></addOriginLine>)", 300},
+        {"scatter",
+         R"(<addFitLine target="total" primary="true" type="linear"><style value="stroke:#FF00FF;stroke-width:2pt"/></addFitLine>)",
+         500},
+        {"simple-bar",
+         R"(<addDataLabels labelLocationVertical="positive"><labeling variable="y"/><style color="#FF00FF" font-size="14pt"/></addDataLabels>)",
+         40},
     };
     for (const Row& r : rows) {
         SCOPED_TRACE(r.chart + (" " + r.instruction));

@@ -35,7 +35,8 @@ Extent extentOf(const Image& img, const Rgb& c, int tolerance = 10) {
         for (int x = kX0; x < kX1; ++x)
             if (img.at(x, y).near(c, tolerance)) {
                 ++e.n;
-                e.x0 = std::min(e.x0, x), e.x1 = std::max(e.x1, x), e.y0 = std::min(e.y0, y), e.y1 = std::max(e.y1, y);
+                e.x0 = std::min(e.x0, x), e.x1 = std::max(e.x1, x), e.y0 = std::min(e.y0, y),
+                e.y1 = std::max(e.y1, y);
                 e.mx += x;
             }
     e.mx /= std::max(e.n, 1);
@@ -55,7 +56,8 @@ TEST(StatsRender, PieWedgesHoldTheCategorySharesInCycleColoursAndTurnBothWays) {
         const Rgb colours[] = {kBlue, kGreen, kSand};
         int hits[3] = {0, 0, 0}, all = 0;
         for (int i = 0; i < 720; ++i) {
-            const Rgb p = img.at(int(cx + r * std::sin(i * M_PI / 360)), int(cy - r * std::cos(i * M_PI / 360)));
+            const Rgb p =
+                img.at(int(cx + r * std::sin(i * M_PI / 360)), int(cy - r * std::cos(i * M_PI / 360)));
             for (int k = 0; k < 3; ++k)
                 if (p.near(colours[k], 10))
                     ++hits[k], ++all;
@@ -137,16 +139,25 @@ TEST(StatsRender, QuantilesAndIntervalMultipliers) {
     const struct {
         double got, want;
     } rows[] = {
-        {quantile(v, 0.5), 7},          {quantile(v, 0.25), 3},     {quantile(v, 0.75), 11},
-        {quantile(v, 0.1), 1},          {quantile({2, 4}, 0.5), 3}, {mean({1, 2, NAN, 6}), 3},
+        {quantile(v, 0.5), 7},
+        {quantile(v, 0.25), 3},
+        {quantile(v, 0.75), 11},
+        {quantile(v, 0.1), 1},
+        {quantile({2, 4}, 0.5), 3},
+        {mean({1, 2, NAN, 6}), 3},
         {standardDeviation({2, 4, 4, 4, 5, 5, 7, 9}), std::sqrt(32 / 7.0)},
-        {normalQuantile(0.975), 1.959964}, {normalQuantile(0.005), -2.575829},
-        {tQuantile(0.975, 1), 12.7062}, {tQuantile(0.975, 2), 4.3027}, {tQuantile(0.975, 4), 2.7764},
-        {tQuantile(0.975, 10), 2.2281}, {tQuantile(0.995, 30), 2.7500},
+        {normalQuantile(0.975), 1.959964},
+        {normalQuantile(0.005), -2.575829},
+        {tQuantile(0.975, 1), 12.7062},
+        {tQuantile(0.975, 2), 4.3027},
+        {tQuantile(0.975, 4), 2.7764},
+        {tQuantile(0.975, 10), 2.2281},
+        {tQuantile(0.995, 30), 2.7500},
     };
     for (const auto& r : rows)
         EXPECT_NEAR(r.got, r.want, 2e-3);
-    EXPECT_TRUE(std::isnan(quantile({}, 0.5)) && std::isnan(standardDeviation({1})) && std::isnan(tQuantile(1, 5)));
+    EXPECT_TRUE(std::isnan(quantile({}, 0.5)) && std::isnan(standardDeviation({1})) &&
+                std::isnan(tQuantile(1, 5)));
 }
 
 } // namespace
