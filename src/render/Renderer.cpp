@@ -212,7 +212,11 @@ bool ChartRenderer::draw(const GrxVisualization* const* charts, int count, Forma
         const StyleBook styles(root);
         const ChartData data(root);
         const Page page{canvas, styles, data};
-        drawPage(page, root, Rect{width_ * i, 0, width_, height_});
+        // Side by side, neither chart's overflowing text reaches into the other.
+        const Rect area{width_ * i, 0, width_, height_};
+        canvas.pushClip(area);
+        drawPage(page, root, area);
+        canvas.pop();
     }
     out = canvas.finish();
     if (out.empty()) {
