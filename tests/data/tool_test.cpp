@@ -29,11 +29,7 @@ TEST(DataTool, ShowRefusalsAndUsage) {
     std::ofstream(tmp.file("cut"), std::ios::binary) << stream.substr(0, stream.size() / 2);
     std::ofstream(tmp.file("none.xml")) << "<gs:graphSources/>";
     const std::string cut = " '" + tmp.file("cut") + "'";
-    const struct {
-        std::string args;
-        int exitCode;
-        std::vector<const char*> texts;
-    } rows[] = {
+    const std::vector<ToolRun> rows = {
         {"show '" + kData + "simple-bar.stream' --rows 2",
          0,
          {"data stream: 1 data source\n\nsource \"graphdataset\": 120 rows, 8 variables\n",
@@ -53,14 +49,8 @@ TEST(DataTool, ShowRefusalsAndUsage) {
         {"show a b", 2, {"more than one input file"}},
         {"show x --rows many", 2, {"needs a whole number, not 'many'"}},
         {"to-stream x --compressed", 2, {"unknown option '--compressed'"}},
-        {"--help", 0, {"to-stream XMLDATA"}},
-    };
-    for (const auto& row : rows) {
-        const ToolResult r = runTool("data " + row.args);
-        EXPECT_EQ(r.exitCode, row.exitCode) << row.args << "\n" << r.output;
-        for (const char* text : row.texts)
-            EXPECT_NE(r.output.find(text), std::string::npos) << row.args << "\n" << r.output;
-    }
+        {"--help", 0, {"to-stream XMLDATA"}}};
+    expectToolRuns("data ", rows);
 }
 
 } // namespace

@@ -28,18 +28,14 @@ TEST(ScratchlocPathFactory, ServesOnlyTheResourceFolderAndReadsTheVariableEachCa
         EXPECT_EQ(PathFactory::getPathInstance(other), nullptr) << other;
 
     const std::string sourceResources = std::string(PLOTAID_SOURCE_DIR) + "/resources/";
-    {
-        ScopedEnv variable("PLOTAID_RESOURCE_DIR", "/opt/charts/res");
-        EXPECT_EQ(resourcePath(), "/opt/charts/res/");
-    }
-    {
-        ScopedEnv variable("PLOTAID_RESOURCE_DIR", "/elsewhere/");
-        EXPECT_EQ(resourcePath(), "/elsewhere/");
-    }
     // Set but empty counts as unset: a build tree falls back to the source's resources.
-    for (const char* unset : {"", static_cast<const char*>(nullptr)}) {
-        ScopedEnv variable("PLOTAID_RESOURCE_DIR", unset);
-        EXPECT_EQ(resourcePath(), sourceResources);
+    const std::pair<const char*, std::string> cases[] = {{"/opt/charts/res", "/opt/charts/res/"},
+                                                         {"/elsewhere/", "/elsewhere/"},
+                                                         {"", sourceResources},
+                                                         {nullptr, sourceResources}};
+    for (const auto& [value, path] : cases) {
+        ScopedEnv variable("PLOTAID_RESOURCE_DIR", value);
+        EXPECT_EQ(resourcePath(), path) << (value ? value : "unset");
     }
     EXPECT_TRUE(fs::is_directory(sourceResources));
 }

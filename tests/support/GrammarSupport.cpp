@@ -143,13 +143,17 @@ std::string chartFaults(const std::string& chart) {
             out += e + "; ";
         return out;
     }
+    return lintFaults("grxml-2.9.xsd", chart);
+}
+
+std::string lintFaults(const std::string& schema, const std::string& text) {
     if (!haveXmllint())
         return std::string();
     static unsigned counter = 0;
-    const std::string file = writeScratch("chart-" + std::to_string(++counter) + ".xml", chart);
-    const LintResult result = xmllint("grxml-2.9.xsd", file);
+    const std::string file = writeScratch("lint-" + std::to_string(++counter) + ".xml", text);
+    const LintResult result = xmllint(schema, file);
     std::remove(file.c_str());
-    return result.exitCode == 0 ? std::string() : "xmllint rejects the chart: " + result.output;
+    return result.exitCode == 0 ? std::string() : "xmllint rejects the text: " + result.output;
 }
 
 std::string chartFaults(const GrxVisualization& chart) {

@@ -47,6 +47,8 @@ std::string duplicateIds(const XERCES_CPP_NAMESPACE::DOMDocument* document);
 std::string chartFaults(const std::string& chart);
 // both, and the ids, on the chart as the library prints it.
 std::string chartFaults(const GrxVisualization& chart);
+// what xmllint says of the text against schema; empty when it accepts it or is not installed.
+std::string lintFaults(const std::string& schema, const std::string& text);
 
 // The data document of a small store, byte for byte as the XML data handler writes it.
 std::string dataDocument(const std::string& sources);

@@ -12,17 +12,9 @@ namespace {
 const std::string kCharts = std::string(PLOTAID_EXAMPLES_DIR) + "/charts/";
 const std::string kPmml = std::string(PLOTAID_EXAMPLES_DIR) + "/pmml/credit-risk.xml";
 
-bool has(const ToolResult& r, const std::string& text) {
-    return r.output.find(text) != std::string::npos;
-}
-
 // The commands' answers that need no files: exit code, and text that must be in the output.
 TEST(Tool, CommandLinesWithoutFiles) {
-    const struct {
-        const char* args;
-        int exitCode;
-        std::vector<const char*> lines;
-    } cases[] = {
+    const std::vector<ToolRun> cases = {
         {"--version", 0, {"plotaid "}},
         {"--help", 0, {"usage: plotaid", "compress", "decompress"}},
         {"", 2, {}},
@@ -61,7 +53,8 @@ TEST(Tool, CommandLinesWithoutFiles) {
         {"decompress -h", 0, {"--limit BYTES"}},
         {"validate", 2, {}},
         {"validate --help", 0, {"usage: plotaid validate FILE..."}},
-        {"text --language de --at 2026-03-04T09:05:07 '@@current_weekday@@ @@current_monthname@@ )TIME' x",
+        {"text --language de --at 2026-03-04T09:05:07 '@@current_weekday@@ @@current_monthname@@ "
+         ")TIME' x",
          0,
          {"Mittwoch März 9:05:07 vorm.\nx\n"}},
         {"text --at 2026-02-29T09:05:07 x", 2, {"'2026-02-29T09:05:07' is not a moment"}},
@@ -76,15 +69,8 @@ TEST(Tool, CommandLinesWithoutFiles) {
         {"pack", 2, {"no chart given"}},
         {"pack a b", 2, {"unexpected argument 'b'"}},
         {"pack /nonexistent.xml", 1, {"/nonexistent.xml"}},
-        {"apply --help", 0, {"--pack lays out"}},
-    };
-    for (const auto& c : cases) {
-        SCOPED_TRACE(c.args);
-        const ToolResult r = runTool(c.args);
-        EXPECT_EQ(r.exitCode, c.exitCode) << r.output;
-        for (const char* line : c.lines)
-            EXPECT_TRUE(has(r, line)) << "no \"" << line << "\" in\n" << r.output;
-    }
+        {"apply --help", 0, {"--pack lays out"}}};
+    expectToolRuns("", cases);
 }
 
 // A file with one replacement, written to a scratch file.
@@ -122,13 +108,14 @@ TEST(ToolValidate, EachFileGetsALineAndAnyFaultFailsTheRun) {
         SCOPED_TRACE(file);
         const ToolResult r = runTool("validate '" + file + "'");
         EXPECT_EQ(r.exitCode, line.rfind(": valid", 0) == 0 ? 0 : 1) << r.output;
-        EXPECT_TRUE(has(r, file + line)) << r.output;
+        EXPECT_TRUE(outputHas(r, file + line)) << r.output;
         all += " '" + file + "'";
     }
     const ToolResult r = runTool(all);
     EXPECT_EQ(r.exitCode, 1);
-    EXPECT_TRUE(has(r, "'chart'") && has(r, "Bogus") && has(r, "root element 'style'")) << r.output;
-    EXPECT_TRUE(has(r, kCharts + "pie.xml: valid") && has(r, settings + ": valid")) << r.output;
+    EXPECT_TRUE(outputHas(r, "'chart'") && outputHas(r, "Bogus") && outputHas(r, "root element 'style'"))
+        << r.output;
+    EXPECT_TRUE(outputHas(r, kCharts + "pie.xml: valid") && outputHas(r, settings + ": valid")) << r.output;
     EXPECT_EQ(runTool("validate '" + kCharts + "pie.xml' '" + kCharts + "boxplot.xml'").exitCode, 0);
 }
 
@@ -137,16 +124,12 @@ TEST(ToolValidate, EachFileGetsALineAndAnyFaultFailsTheRun) {
 TEST(ToolTemplate, ConvertsEarlierFormsOnly) {
     useSourceGrammars();
     const std::string earlier = std::string(PLOTAID_EXAMPLES_DIR) + "/templates/earlier/axes.xml";
-    const std::string out = writeScratch("converted.sgt", "");
-    ASSERT_EQ(runTool("template convert '" + earlier + "' -o '" + out + "'").exitCode, 0);
+    const std::string out = writeScratch("converted.sgt", ""), broken = writeScratch("broken.xml", "<graph>");
+    expectToolRuns("", {{"template convert '" + earlier + "' -o '" + out + "'", 0, {}},
+                        {"validate '" + out + "'", 0, {": valid (template, grxml-template-1.0.xsd)"}},
+                        {"template convert '" + out + "'", 1, {"of the current form already"}},
+                        {"template convert '" + broken + "'", 1, {"broken.xml:1:8: "}}});
     EXPECT_NE(readText(out).find("<setAxisMajorTicks"), std::string::npos);
-    EXPECT_TRUE(has(runTool("validate '" + out + "'"), ": valid (template, grxml-template-1.0.xsd)"));
-    const ToolResult current = runTool("template convert '" + out + "'");
-    EXPECT_EQ(current.exitCode, 1);
-    EXPECT_TRUE(has(current, "of the current form already")) << current.output;
-    const ToolResult broken = runTool("template convert '" + writeScratch("broken.xml", "<graph>") + "'");
-    EXPECT_EQ(broken.exitCode, 1);
-    EXPECT_TRUE(has(broken, "broken.xml:1:8: ")) << broken.output;
 }
 
 // The packed chart is sound and packs to itself; "apply --pack" packs after the templates.
@@ -155,34 +138,29 @@ TEST(ToolPack, PacksTheChartAndAfterTemplates) {
     const std::string chart = kCharts + "histogram.xml", out = writeScratch("packed.xml", "");
     const std::string attached = "part=\"bottom\" target=\"frame_footnote_2\"";
     ASSERT_EQ(runTool("pack '" + chart + "' -o '" + out + "'").exitCode, 0);
-    EXPECT_TRUE(has(runTool("validate '" + out + "'"), ": valid (chart")) << readText(out);
+    EXPECT_TRUE(outputHas(runTool("validate '" + out + "'"), ": valid (chart")) << readText(out);
     EXPECT_NE(readText(out).find(attached), std::string::npos);
     EXPECT_EQ(runTool("pack '" + out + "' --reference '" + chart + "'").output, readText(out));
     const std::string tidy = std::string(PLOTAID_EXAMPLES_DIR) + "/templates/bar-tidy.sgt";
     for (const bool pack : {false, true}) {
-        const ToolResult r = runTool("apply --chart '" + chart + "' --template '" + tidy + "'" + (pack ? " --pack" : ""));
+        const ToolResult r =
+            runTool("apply --chart '" + chart + "' --template '" + tidy + "'" + (pack ? " --pack" : ""));
         EXPECT_EQ(r.exitCode, 0) << r.output;
-        EXPECT_EQ(has(r, attached), pack);
+        EXPECT_EQ(outputHas(r, attached), pack);
     }
 }
-
-} // namespace
-
-namespace {
 
 // Popups from the command line: once per chart, with or without templates.
 TEST(ToolApply, PopupsOncePerChart) {
     const std::string out = writeScratch("with-popups.xml", "");
-    const ToolResult first = runTool("apply --chart " + kCharts + "scatter.xml --popups -o " + out);
-    EXPECT_EQ(first.exitCode, 0) << first.output;
+    expectToolRuns("apply ", {{"--chart " + kCharts + "scatter.xml --popups -o " + out, 0, {}}});
     const std::string chart = readText(out);
-    EXPECT_NE(chart.find("tokenTemplate=\"Beginning Salary = $[1]$"), std::string::npos) << chart.substr(0, 300);
+    EXPECT_NE(chart.find("tokenTemplate=\"Beginning Salary = $[1]$"), std::string::npos)
+        << chart.substr(0, 300);
     EXPECT_EQ(chartFaults(chart), "");
-    const ToolResult again = runTool("apply --chart " + out + " --popups -o " + out);
-    EXPECT_EQ(again.exitCode, 1);
-    EXPECT_TRUE(has(again, "the chart has popups already")) << again.output;
-    EXPECT_TRUE(has(runTool("apply --help"), "--popups"));
-    EXPECT_EQ(runTool("apply --chart " + out).exitCode, 2);
+    expectToolRuns("apply ", {{"--chart " + out + " --popups -o " + out, 1, {"the chart has popups already"}},
+                              {"--help", 0, {"--popups"}},
+                              {"--chart " + out, 2, {}}});
 }
 
 } // namespace

@@ -26,33 +26,28 @@ TEST_F(TransformerTest, ToolSplitsMergesAppliesAndRefuses) {
     std::ofstream(dir.file("trunc.z"), std::ios::binary) << std::string("x\x9c\x01\x02", 4);
     std::ofstream(dir.file("bad.z"), std::ios::binary) << std::string("x\x9c garbage", 10);
     const std::string apply = "apply --chart @c.xml --template %templates/bar-tidy.sgt --entire --data ";
-    const struct {
-        std::string args;
-        int exitCode;
-        const char* text;
-    } steps[] = {
-        {"chart split %charts/area.xml -o @area.chart.xml", 0, ""},
-        {"chart merge @area.chart.xml @area.data.xml -o @whole.xml", 0, ""},
-        {"chart split %charts/area.xml -o @c.xml --compressed", 0, ""},
-        {apply + "%data/area.stream -o @out.xml", 0, ""},
-        {apply + "%data/area.xml --compressed -o @out.z", 0, ""},
-        {"chart split @my.xml", 0, ""},
-        {"chart merge @my.chart.xml @my.data.xml -o @my.whole.xml", 0, ""},
+    std::vector<ToolRun> steps = {
+        {"chart split %charts/area.xml -o @area.chart.xml", 0, {}},
+        {"chart merge @area.chart.xml @area.data.xml -o @whole.xml", 0, {}},
+        {"chart split %charts/area.xml -o @c.xml --compressed", 0, {}},
+        {apply + "%data/area.stream -o @out.xml", 0, {}},
+        {apply + "%data/area.xml --compressed -o @out.z", 0, {}},
+        {"chart split @my.xml", 0, {}},
+        {"chart merge @my.chart.xml @my.data.xml -o @my.whole.xml", 0, {}},
         // A chart where its data belong is refused, not merged into a chart without rows.
-        {"chart merge @my.chart.xml @my.xml", 1, "not a data document"},
-        {"apply --chart %charts/area.xml --data @junk.bin --template %templates/bar-tidy.sgt", 1,
-         "junk.bin: "},
-        {"chart merge %charts/area.xml @trunc.z", 1, "cannot be decompressed"},
-        {"chart split @bad.z -o @o.xml", 1, "the chart cannot be read"},
-        {"chart", 2, "usage: plotaid chart split"},
-        {"chart join a b", 2, "unknown action 'join'"},
-        {"chart merge %charts/area.xml", 2, "needs a chart and its data"},
+        {"chart merge @my.chart.xml @my.xml", 1, {"not a data document"}},
+        {"apply --chart %charts/area.xml --data @junk.bin --template %templates/bar-tidy.sgt",
+         1,
+         {"junk.bin: "}},
+        {"chart merge %charts/area.xml @trunc.z", 1, {"cannot be decompressed"}},
+        {"chart split @bad.z -o @o.xml", 1, {"the chart cannot be read"}},
+        {"chart", 2, {"usage: plotaid chart split"}},
+        {"chart join a b", 2, {"unknown action 'join'"}},
+        {"chart merge %charts/area.xml", 2, {"needs a chart and its data"}},
     };
-    for (const auto& step : steps) {
-        const ToolResult r = runTool(expand(step.args));
-        EXPECT_EQ(r.exitCode, step.exitCode) << step.args << "\n" << r.output;
-        EXPECT_NE(r.output.find(step.text), std::string::npos) << step.args << "\n" << r.output;
-    }
+    for (ToolRun& step : steps)
+        step.args = expand(step.args);
+    expectToolRuns("", steps);
     EXPECT_EQ(Parsed(readAll(dir.file("area.chart.xml"))).idsOf(u"userSource"),
               std::vector<std::string>{"rain"});
     EXPECT_EQ(readAll(dir.file("whole.xml")),

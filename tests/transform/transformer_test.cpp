@@ -218,11 +218,7 @@ TEST_F(TransformerTest, WrittenDocumentsValidate) {
                        static_cast<unsigned>(stream.size()));
     for (const std::string& data : {inflate(t.getCompressedData()), inflate(s.getCompressedData())}) {
         ASSERT_TRUE(ChartBase::ValidXML(data));
-        if (grammar_test::haveXmllint()) {
-            const auto lint =
-                grammar_test::xmllint("grxml-data-2.1.xsd", grammar_test::writeScratch("data.xml", data));
-            EXPECT_EQ(lint.exitCode, 0) << lint.output;
-        }
+        EXPECT_EQ(grammar_test::lintFaults("grxml-data-2.1.xsd", data), "");
     }
 }
 

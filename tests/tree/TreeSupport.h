@@ -82,16 +82,6 @@ private:
     plotaid::detail::ValidatingParser parser_;
 };
 
-// The second, independent validator: 0 when it accepts the text (or is not installed).
-inline int xmllint(const std::string& text, const std::string& schema) {
-    if (!grammar_test::haveXmllint())
-        return 0;
-    const grammar_test::LintResult r =
-        grammar_test::xmllint(schema, grammar_test::writeScratch("tree.xml", text));
-    EXPECT_EQ(r.exitCode, 0) << r.output;
-    return r.exitCode;
-}
-
 // Whether one of the error messages reported while it lives contains the text.
 inline bool mentions(const engine_test::Records& records, const std::string& part) {
     for (const std::string& message : records.errors())

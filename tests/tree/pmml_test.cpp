@@ -57,7 +57,7 @@ TEST_P(TreePmmlExamples, CompressedInflatesToTheOriginalAndPlainIsTheSameValidTr
          {"Node", "SimplePredicate", "CompoundPredicate", "ScoreDistribution", "DataField", "Header"})
         for (const char* key : {"id", "value", "recordCount", "description"})
             EXPECT_EQ(values(source, name, key), values(out, name, key)) << name << " " << key;
-    EXPECT_EQ(xmllint(text, "pmml-2-1.xsd"), 0);
+    EXPECT_EQ(grammar_test::lintFaults("pmml-2-1.xsd", text), "");
 }
 
 INSTANTIATE_TEST_SUITE_P(Examples, TreePmmlExamples,

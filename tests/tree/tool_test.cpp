@@ -14,11 +14,7 @@ TEST(TreeTool, OptionsModelsAndRefusals) {
     std::ofstream(dir.file("settings.xml")) << "<displaySettings/>";
     const std::string pmml = " --pmml '" + std::string(PLOTAID_EXAMPLES_DIR) + "/pmml/",
                       credit = pmml + "credit-risk.xml'";
-    const struct {
-        std::string args;
-        int exitCode;
-        std::vector<const char*> texts;
-    } rows[] = {
+    const std::vector<ToolRun> rows = {
         {credit + " --orientation left-to-right --zoom 250 --contents both --font Serif --colors swatch "
                   "'#FF010101,#FF020202' --language de-CH",
          0,
@@ -35,14 +31,8 @@ TEST(TreeTool, OptionsModelsAndRefusals) {
         {credit + " --pmml-out -", 2, {"name a file for the model"}},
         {credit + " --settings" + in("settings.xml"), 1, {"is not valid display settings"}},
         {" --pmml" + in("missing.xml"), 1, {"cannot open"}},
-        {" --pmml" + in("bad.xml") + " --pmml-out" + in("o.xml"), 1, {"not a valid PMML 2.1 tree"}},
-    };
-    for (const auto& row : rows) {
-        const ToolResult r = runTool("tree" + row.args);
-        EXPECT_EQ(r.exitCode, row.exitCode) << row.args << "\n" << r.output;
-        for (const char* text : row.texts)
-            EXPECT_NE(r.output.find(text), std::string::npos) << text << " not in\n" << r.output;
-    }
+        {" --pmml" + in("bad.xml") + " --pmml-out" + in("o.xml"), 1, {"not a valid PMML 2.1 tree"}}};
+    expectToolRuns("tree", rows);
     Reader reader;
     EXPECT_NE(reader.read(runTool("tree" + credit).output), nullptr);
     EXPECT_EQ(elements(reader.read(readAll(dir.file("out.xml"))), "CompoundPredicate").size(), 4u);
