@@ -32,14 +32,15 @@ struct Tick {
     std::string label;
 };
 
-std::vector<Tick> ticksOf(const Scale& s, const AxisParts& p) {
+// `count` is about how many ticks the axis has room for.
+std::vector<Tick> ticksOf(const Scale& s, const AxisParts& p, int count) {
     std::vector<Tick> out;
     if (s.categorical) {
         for (std::size_t i = 0; i < s.categories.size() && i < kMaxTicks; ++i)
             out.push_back({s.atCategory(i), s.categories[i]});
         return out;
     }
-    for (double v : niceTicks(s.from, s.to, number(p.major, "delta", 0), 5))
+    for (double v : niceTicks(s.from, s.to, number(p.major, "delta", 0), count))
         out.push_back({s.at(v), formatNumber(s.mirrored ? std::fabs(v) : v, child(p.major, "format"))});
     return out;
 }
@@ -162,7 +163,10 @@ Prepared prepare(const Page& page, const Element* graph, const Element* coordina
     if (!plot.polar)
         for (std::size_t d = 0; d < 2 && d < dimensions.size(); ++d) {
             parts[d] = partsOf(dimensions[d]);
-            ticks[d] = ticksOf(plot.dims[d], parts[d]);
+            // A narrow panel gets fewer ticks, so that their labels do not run into each other.
+            const bool along = (d == 1) != plot.transposed;
+            const double fits = (along ? cell.h : cell.w) / (unit * (along ? 30 : 60));
+            ticks[d] = ticksOf(plot.dims[d], parts[d], static_cast<int>(std::clamp(fits, 2.0, 5.0)));
             const Style axisStyle = page.styles.resolve(parts[d].axis, "style", page.styles.chart());
             if (!axes || !axisStyle.visible.value_or(true))
                 continue;
