@@ -21,6 +21,7 @@
 #include <xercesc/dom/DOM.hpp>
 
 #include <map>
+#include <sstream>
 #include <stdexcept>
 #include <string>
 #include <vector>
@@ -115,6 +116,67 @@ inline std::string stylesOf(const GrxVisualization& chart, const std::string& id
     return cycleOf(chart, id) ? describeStyles(cycleOf(chart, id)->getImplementation()) : std::string();
 }
 
+// The node a path names: an id, then "/tag" steps each to the first child of that tag ("/tag#2" to
+// the second) and "/@attribute" steps to the element the attribute names; null when a step finds
+// nothing.
+inline const DOMElement* node(const GrxVisualization& chart, const std::string& path) {
+    std::istringstream steps(path);
+    std::string step;
+    std::getline(steps, step, '/');
+    const DOMElement* e = chart.getElementById(ChartString(step));
+    while (e != nullptr && std::getline(steps, step, '/')) {
+        if (step[0] == '@') {
+            e = e->getOwnerDocument()->getElementById(e->getAttribute(ChartString(step.substr(1)).xc_str()));
+            continue;
+        }
+        const std::size_t hash = step.find('#');
+        int n = hash == std::string::npos ? 1 : std::stoi(step.substr(hash + 1));
+        const DOMElement* c = e->getFirstElementChild();
+        while (c != nullptr && (u8(c->getLocalName()) != step.substr(0, hash) || --n > 0))
+            c = c->getNextElementSibling();
+        e = c;
+    }
+    return e;
+}
+// "path.attribute": the attribute's text ("-" when absent); a bare path: every attribute but the id,
+// "name=value;" each; "path/tag*": every child of that tag, "{name=value;...}" each; "<none>" without
+// the node.
+inline std::string at(const GrxVisualization& chart, const std::string& path) {
+    const std::size_t slash = path.rfind('/'), dot = path.find('.', slash == std::string::npos ? 0 : slash);
+    if (path.back() == '*') {
+        std::string out;
+        const DOMElement* parent = node(chart, path.substr(0, slash));
+        for (const DOMElement* c = parent ? parent->getFirstElementChild() : nullptr; c;
+             c = c->getNextElementSibling())
+            if (u8(c->getLocalName()) == path.substr(slash + 1, path.size() - slash - 2))
+                out += "{" + attributesOf(c) + "}";
+        return parent ? out : "<none>";
+    }
+    const DOMElement* e = node(chart, path.substr(0, dot));
+    return !e ? "<none>" : dot == std::string::npos ? attributesOf(e) : attr(e, path.substr(dot + 1));
+}
+// Checks each "path=value" of `expected` (see at()), '|' between them.
+inline void expectAt(const GrxVisualization& chart, const std::string& expected) {
+    std::istringstream in(expected);
+    for (std::string item; std::getline(in, item, '|');)
+        EXPECT_EQ(at(chart, item.substr(0, item.find('='))), item.substr(item.find('=') + 1)) << item;
+}
+// The word the tool prints for an outcome.
+inline std::string label(const InstructionOutcome& o) {
+    return o.kind == InstructionOutcome::Applied  ? "applied"
+           : o.kind == InstructionOutcome::Failed ? "failed"
+                                                  : "unsupported";
+}
+
+// A template body walked on a fresh sample: the outcomes' words, and what the chart then holds
+// ("path=value|...", see at(); "unchanged" for a chart the walk left as it was).
+struct Walked {
+    const char* chart;
+    std::string body;
+    const char* outcomes;
+    std::string expected;
+};
+
 // The base as an action that does nothing, to reach its shared operations.
 class Probe : public BaseTemplate {
 public:
@@ -161,11 +223,47 @@ protected:
     const DOMElement* instruction(const std::string& body) {
         return templateRoot(body)->getFirstElementChild();
     }
-    // The first instruction of `body` through the walk; whether it reported itself applied.
-    bool applyOnce(const std::string& body, GrxVisualization& chart) {
+    // The outcomes' words of `body` walked on the chart, a space after each.
+    std::string walk(GrxVisualization& chart, const std::string& body) {
         WalkReport report;
         plotaid::detail::applyTemplateCommands(nullptr, chart, templateRoot(body));
-        return report.outcomes().size() == 1 && report.outcomes()[0].kind == InstructionOutcome::Applied;
+        std::string words;
+        for (const InstructionOutcome& o : report.outcomes())
+            words += label(o) + " ";
+        return words;
+    }
+    // The first instruction of `body` through the walk; whether it reported itself applied.
+    bool applyOnce(const std::string& body, GrxVisualization& chart) {
+        return walk(chart, body) == "applied ";
+    }
+    void expectWalks(const std::vector<Walked>& rows) {
+        for (const Walked& row : rows) {
+            SCOPED_TRACE(std::string(row.chart) + ": " + row.body);
+            GrxVisualization& chart = sample(row.chart);
+            const std::string before = canonical(chart);
+            EXPECT_EQ(walk(chart, row.body), row.outcomes);
+            if (row.expected == "unchanged")
+                EXPECT_EQ(canonical(chart), before);
+            else
+                expectAt(chart, row.expected);
+            EXPECT_EQ(grammar_test::chartFaults(chart), "");
+        }
+    }
+    // Each instruction through the walk changes a fresh sample into a sound chart, and applied
+    // twice to another leaves the same chart as once.
+    void expectTwiceIsOnce(const std::vector<std::pair<const char*, const char*>>& cases) {
+        for (const auto& [name, body] : cases) {
+            SCOPED_TRACE(body);
+            GrxVisualization& once = sample(name);
+            GrxVisualization& twice = sample(name);
+            const std::string original = canonical(once);
+            applyOnce(body, once);
+            applyOnce(body, twice);
+            applyOnce(body, twice);
+            EXPECT_NE(canonical(once), original);
+            EXPECT_EQ(canonical(twice), canonical(once));
+            EXPECT_EQ(grammar_test::chartFaults(once), "");
+        }
     }
     // The action T of the first instruction of `body`, applied once.
     template <class T>
