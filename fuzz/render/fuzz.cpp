@@ -11,12 +11,6 @@
 #include <cstdlib>
 #include <string>
 
-// Fontconfig, under Pango, keeps font patterns for the life of the process where the leak checker
-// cannot see them; they are the same few whatever the input.
-extern "C" __attribute__((visibility("default"))) const char* __lsan_default_suppressions() {
-    return "leak:libfontconfig.so\n";
-}
-
 extern "C" int LLVMFuzzerInitialize(int*, char***) {
     static const plotaid::detail::XercesRuntime held;
     ::unsetenv("DumpChartXMLPath"); // no error log or dumps: the fuzzer would fill the disk
