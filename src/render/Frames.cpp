@@ -1,5 +1,6 @@
 #include "render/Frames.h"
 
+#include <algorithm>
 #include <cmath>
 #include <set>
 
@@ -63,9 +64,11 @@ std::map<const Element*, Rect> layoutFrames(const std::vector<const Element*>& f
         return s;
     };
     std::map<const Element*, TextSize> measured;
-    // Each pass settles what its targets allow; as many passes as frames settle any chain, and
-    // whatever stays open after that is a cycle or a dangling target.
-    for (std::size_t pass = 0; pass <= frames.size(); ++pass) {
+    // Each pass settles what its targets allow. A chain of attachments settles one frame per pass,
+    // so a hostile chart with thousands of chained frames would cost passes times frames; no real
+    // layout chains more than a few, and what stays open falls back to the page.
+    const std::size_t passes = std::min<std::size_t>(frames.size() + 1, 64);
+    for (std::size_t pass = 0; pass < passes; ++pass) {
         bool progress = false;
         for (const Element* f : frames) {
             Box& b = boxes[f];
