@@ -118,9 +118,12 @@ const Column* ChartData::variable(const std::string& id) const {
     return listed.empty() ? nullptr : listed.front();
 }
 
-std::vector<std::string> ChartData::categories(const std::string& variableId,
-                                               const std::string& domainId) const {
-    std::vector<std::string> out;
+const std::vector<std::string>& ChartData::categories(const std::string& variableId,
+                                                      const std::string& domainId) const {
+    const auto key = std::make_pair(variableId, domainId);
+    if (const auto known = categories_.find(key); known != categories_.end())
+        return known->second;
+    std::vector<std::string>& out = categories_[key];
     std::set<std::string> seen;
     const Element* domain = byId(root_, domainId);
     if (domain == nullptr) {

@@ -41,9 +41,9 @@ public:
     // The columns an expression variable lists ("a/b/c"), for matrix layouts.
     std::vector<const Column*> expressionColumns(const std::string& id) const;
     // The categories of a categorical variable: the domain's order when the chart gives one,
-    // else first appearance.
-    std::vector<std::string> categories(const std::string& variableId,
-                                        const std::string& domainId = "") const;
+    // else first appearance. Worked out once per variable and domain: marks ask for every row.
+    const std::vector<std::string>& categories(const std::string& variableId,
+                                               const std::string& domainId = "") const;
     std::size_t rowCount(const std::string& variableId) const;
 
 private:
@@ -51,6 +51,7 @@ private:
     const Element* root_;
     std::map<std::string, Table> tables_;
     mutable std::map<std::string, Column> columns_;
+    mutable std::map<std::pair<std::string, std::string>, std::vector<std::string>> categories_;
 };
 
 // Parses a number the way the chart writes it ("." decimal, no grouping); NaN otherwise.

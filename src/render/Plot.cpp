@@ -154,7 +154,7 @@ Style Plot::rowStyle(const Element* mark, std::size_t row, const char* styleAttr
                 continue;
             std::size_t index = 0;
             if (c->categorical) {
-                const auto cats = data.categories(variable, attr(a, "domain"));
+                const auto& cats = data.categories(variable, attr(a, "domain"));
                 const auto it = std::find(cats.begin(), cats.end(), c->text[row]);
                 if (it == cats.end())
                     continue;
@@ -180,9 +180,7 @@ Style Plot::rowStyle(const Element* mark, std::size_t row, const char* styleAttr
                 if (entry.dash)
                     s.dash = entry.dash;
             } else {
-                Style keep = s;
-                keep.layer(entry);
-                s = keep;
+                s.layer(entry);
             }
         }
     for (const Element* c : children(mark, "conditionalStyle"))
