@@ -56,6 +56,7 @@ TEST_F(SplitInfo, LabelAndHeadingOfTheLatestCase) {
     std::unique_ptr<feed::BpHeading> heading(info.activateSplit(graph));
     ASSERT_NE(heading, nullptr);
     EXPECT_EQ(heading->Procedure(), "GRAPH");
+    EXPECT_EQ(heading->Pattern(), "[%1 = %2:, ^1 = ^2:]1"); // the host lays the heading out by it
     EXPECT_EQ(heading->Text(), "Sales region = North, city = Oslo");
     source.suppressSplitHeading("FREQUENCIES");
     feed::BpProcedure frequencies("FREQUENCIES");
