@@ -143,7 +143,6 @@ TEST(Dumps, OptionsCharactersSwitchKindsAndFilesTakeNameCountExtensionAndTheByte
         {"0000110001", {4, 5, 9}},
         {"11111111111111", {0, 1, 2, 3, 4, 5, 6, 7, 8, 9}},
         {"x0y", {0, 2}},
-        {"1", {0}},
         {"", {0}},
         {"01", {1}}};
     for (const auto& [options, kinds] : cases) {

@@ -128,7 +128,6 @@ TEST_F(Formats, NumberDateAndTimeTypes) {
         {15, 8, 2, "minimumIntegerDigits#5"},
         {16, 8, 2, "minimumIntegerDigits#6"},
         {15, 2, 5, "minimumIntegerDigits#0"},
-        {16, 2, 5, "minimumIntegerDigits#0"},
         {5, 8, 2, "minimumIntegerDigits#40", [] { kovar::setMinIntegerDigits(0xFFFFFFFFu); }},
         // A number width of 60 is read as 40 before conversion.
         {16, 60, 2, "minimumIntegerDigits#38"},

@@ -34,7 +34,6 @@ TEST(TreeTool, OptionsModelsAndRefusals) {
         {" --pmml" + in("bad.xml") + " --pmml-out" + in("o.xml"), 1, {"not a valid PMML 2.1 tree"}}};
     expectToolRuns("tree", rows);
     Reader reader;
-    EXPECT_NE(reader.read(runTool("tree" + credit).output), nullptr);
     EXPECT_EQ(elements(reader.read(readAll(dir.file("out.xml"))), "CompoundPredicate").size(), 4u);
     EXPECT_EQ(readAll(dir.file("again.xml")), readAll(dir.file("out.xml")));
 }
