@@ -54,6 +54,20 @@ TEST_F(BaseTemplateTest, DimensionRolesCountReferencesButReturnOnlyDimensions) {
             << role;
 }
 
+// A scatterplot matrix element needs slashes in both expressions.
+TEST_F(BaseTemplateTest, AScatterplotMatrixElementHasSlashesInBothExpressions) {
+    GrxPoint& point = g_.addPoint();
+    GrxExpressionVariable& ex = chart_.addExpressionVariable();
+    GrxExpressionVariable& ey = chart_.addExpressionVariable();
+    ex.setValue(u"a/b");
+    ey.setValue(u"c");
+    point.addX().setVariable(ex);
+    point.addY().setVariable(ey);
+    EXPECT_EQ(probe_.getFirstSPLOMElement(g_), nullptr);
+    ey.setValue(u"c/d");
+    EXPECT_EQ(probe_.getFirstSPLOMElement(g_), &point);
+}
+
 TEST_F(BaseTemplateTest, BooleanAttributesAreExactAndCoordinatesMatchByPosition) {
     const DOMElement* e = instruction({{u"a", u"true"}, {u"b", u"false"}, {u"c", u"TRUE"}, {u"d", u""}});
     const struct {
