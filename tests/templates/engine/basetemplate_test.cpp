@@ -1,4 +1,4 @@
-// The operations every action shares: styles, graphs, dimensions, elements and variables.
+// The operations every action shares: graphs, dimensions, attributes, coordinates and variables.
 #include "templates/TemplateSupport.h"
 
 using namespace template_test;
@@ -18,24 +18,6 @@ protected:
     GrrUviza& g_ = chart_.addGraph();
     Probe probe_{nullptr, chart_, nullptr};
 };
-
-TEST_F(BaseTemplateTest, StylesGoIntoOneContainerUnderFreshIdsAndExistingOnesAreReused) {
-    GrxStyle& own = chart_.addStyle();
-    own.setId(u"titleStyle");
-    g_.setId(u"main");
-    EXPECT_EQ(&probe_.addStyle(chart_, u"titleStyle"), &own);
-    EXPECT_EQ(chart_.getStyleById(u"c-o-n-t-a-i-n-er"), nullptr) << "nothing added for an existing style";
-    GrxStyle& first = probe_.addStyle(chart_, u"");
-    GrxStyle& second = probe_.addStyle(chart_, nullptr);
-    GrxStyle& third = probe_.addStyle(chart_, u"main"); // held by a graph, which keeps it
-    EXPECT_EQ(u8(first.getId()) + " " + u8(second.getId()) + " " + u8(third.getId()), "style1 style2 main1");
-    EXPECT_EQ(chart_.getElementById(u"main"), g_.getImplementation());
-    GrxStyle* container = chart_.getStyleById(u"c-o-n-t-a-i-n-er");
-    ASSERT_NE(container, nullptr);
-    EXPECT_EQ(container->getStyles().size(), 3u);
-    EXPECT_EQ(first.getImplementation()->getParentNode(), container->getImplementation());
-    EXPECT_EQ(chart_.getStyles().size(), 2u); // the own style and the container
-}
 
 TEST_F(BaseTemplateTest, GraphsAreSelectedByNumberAndAllCounted) {
     GrrUviza& b = chart_.addGraph();
@@ -72,26 +54,9 @@ TEST_F(BaseTemplateTest, DimensionRolesCountReferencesButReturnOnlyDimensions) {
             << role;
 }
 
-TEST_F(BaseTemplateTest, QuestionsAboutAGraph) {
-    GrxCoordinates& coordinates = g_.addCoordinates();
-    GrxDimension& x = coordinates.addDimension();
-    coordinates.addDimension();
-    EXPECT_FALSE(probe_.isGraphPolar(g_) || probe_.isGraphClustered(g_));
-    coordinates.addPolarTransform();
-    EXPECT_TRUE(probe_.isGraphPolar(g_));
-    x.setClusterVariable(chart_.addSourceVariable());
-    EXPECT_TRUE(probe_.isGraphClustered(g_));
-
-    probe_.addZDimension(g_);
-    probe_.addZDimension(g_); // three already: nothing more
-    ASSERT_EQ(coordinates.getDimensions().size(), 3u);
-    coordinates.getDimensions()[2]->addAxis();
+// A scatterplot matrix element needs slashes in both expressions.
+TEST_F(BaseTemplateTest, AScatterplotMatrixElementHasSlashesInBothExpressions) {
     GrxPoint& point = g_.addPoint();
-    EXPECT_FALSE(probe_.isChartTrue3D(g_));
-    point.addZ();
-    EXPECT_TRUE(probe_.isChartTrue3D(g_));
-
-    // A scatterplot matrix element needs slashes in both expressions.
     GrxExpressionVariable& ex = chart_.addExpressionVariable();
     GrxExpressionVariable& ey = chart_.addExpressionVariable();
     ex.setValue(u"a/b");
@@ -101,31 +66,6 @@ TEST_F(BaseTemplateTest, QuestionsAboutAGraph) {
     EXPECT_EQ(probe_.getFirstSPLOMElement(g_), nullptr);
     ey.setValue(u"c/d");
     EXPECT_EQ(probe_.getFirstSPLOMElement(g_), &point);
-}
-
-TEST_F(BaseTemplateTest, ElementsKindByKindAndRangesAndAxes) {
-    GrxInterval& bar = g_.addInterval();
-    GrxPoint& point = g_.addPoint();
-    GrxLine& line = g_.addLine();
-    std::vector<CTElementType*> all, lines;
-    BaseTemplate::getAllElements(g_, all);
-    EXPECT_EQ(all, (std::vector<CTElementType*>{&point, &line, &bar}));
-    probe_.getAllElementsByType(u"line", lines);
-    EXPECT_EQ(lines, (std::vector<CTElementType*>{&line}));
-
-    EXPECT_FALSE(probe_.isIntervalRangeElement(bar));
-    bar.addSummaryStatistic().setMethod(7);
-    EXPECT_TRUE(probe_.isIntervalRangeElement(bar));
-    point.addSummaryStatistic().setMethod(7);
-    EXPECT_FALSE(probe_.isIntervalRangeElement(point));
-    EXPECT_EQ(probe_.getElementsWithSummaryStatistics(g_), std::vector<CTElementType*>{});
-    line.addSummaryStatistic().setMethod(4);
-    EXPECT_EQ(probe_.getElementsWithSummaryStatistics(g_), (std::vector<CTElementType*>{&line}));
-
-    GrxAxis& axis = g_.addCoordinates().addDimension().addAxis();
-    EXPECT_FALSE(probe_.isAxisDerived(axis));
-    axis.setTransform(0);
-    EXPECT_TRUE(probe_.isAxisDerived(axis));
 }
 
 TEST_F(BaseTemplateTest, BooleanAttributesAreExactAndCoordinatesMatchByPosition) {

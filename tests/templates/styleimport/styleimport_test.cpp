@@ -61,15 +61,12 @@ const Row kRows[] = {
     // Lines take the stroke as their colour, over a CSS colour too, and never a fill.
     {kLine, "lineStyle", R"(<style value="stroke:red;fill:blue"/>)", "color=red|color2=#3E58AC|fill=-"},
     {kLine, "tickLabelStyle", R"(<style value="color:navy;stroke:olive"/>)", "color=olive"},
-    // Filled areas (the chart's own, an interval's, a box hinge) take fill and stroke; a box's own
-    // style and an area's are not among them.
-    {kLine, "visualizationStyle", kNavyRedBlue, "color=blue|color2=red"},
+    // Filled areas take fill and stroke over a CSS colour; a box's own style and an area's are not
+    // among them.
     {kBar, "barStyle", kNavyRedBlue, "color=blue|color2=red"},
-    {"boxplot.xml", "hingeStyle", kNavyRedBlue, "color=blue|color2=red"},
     {"boxplot.xml", "boxStyle", kNavyRedBlue, "color=red|color2=black"},
     {"area.xml", "areaStyle", kNavyRedBlue, "color=red|color2=black"},
     // Font weight: CSS "normal" (exactly) is regular, any other word bold; attributes alike.
-    {kLine, "titleStyle", R"(<style value="font-weight:normal"/>)", "font-weight=regular"},
     {kLine, "tickLabelStyle", R"(<style value="font-weight:600" font-weight="normal"/>)", "font-weight=bold"},
     {kLine, "axisStyle", R"(<style value="font-weight:Normal"/>)", "font-weight=bold"},
     {kLine, "legendTextStyle", R"(<style font-weight="normal"/>)", "font-weight=regular"},
@@ -83,7 +80,6 @@ const Row kRows[] = {
     {kLine, "tickLabelStyle", R"(<style value="min-font-size:6pt"/>)", "font-size=8pt;6pt"},
     // Widths go into their parts.
     {kBar, "barStyle", R"(<style value="max-width:95%"/>)", "width=60%;10%;95%"},
-    {kBar, "barStyle", R"(<style value="width:70%"/>)", "width=70%;10%;90%"},
     // Glyph sides from 2 to 100 only; a glyph child sets only what it says.
     {kScatter, "legendStyle", R"(<style><glyph sides="1"/></style>)", "glyph-sides=-"},
     {kScatter, "legendStyle", R"(<style><glyph sides="101"/></style>)", "glyph-sides=-"},
@@ -189,29 +185,6 @@ TEST_F(StyleImport, AnUnsupportedChildIsReportedAndTheRestStillApplies) {
     EXPECT_NE(readAll(logs.file("chartxml_error.log"))
                   .find("backend/chartxml/plotaid/src/templates/basetemplate, line 4672"),
               std::string::npos);
-}
-
-TEST_F(StyleImport, ImportingTwiceGivesTheSameChartAsOnce) {
-    const std::string style =
-        "<style value=\"fill:#112233;stroke:#445566;font-size:11pt;min-font-size:7pt;font-weight:normal;"
-        "max-width:80%;width:50%;visibility:visible;stroke-dasharray:4 2;odd:1\""
-        R"( font-size="1pt;2pt;3pt" gradient-method="linear" margin-top="1pt">
-             <glyph sides="5" angle="10"/><shadow color="gray" dx="1px"/>
-             <interpolation type="step" pointPosition="right" missingRepresentation="gap"/>
-           </style>)";
-    for (const bool withSource : {false, true}) {
-        for (const char* name : {"line-series.xml", "boxplot.xml"}) {
-            SCOPED_TRACE(std::string(name) + (withSource ? " with source" : ""));
-            const GrxVisualization& source = sample(name);
-            GrxVisualization& once = sample(name);
-            GrxVisualization& twice = sample(name);
-            for (const char16_t* id : {u"lineStyle", u"hingeStyle", u"visualizationStyle"})
-                for (int i = 0; once.getStyleById(id) && i < 3; ++i)
-                    import(i ? twice : once, id, style, withSource ? &source : nullptr);
-            EXPECT_NE(once.AsUTF8(), source.AsUTF8());
-            EXPECT_EQ(twice.AsUTF8(), once.AsUTF8());
-        }
-    }
 }
 
 // A graph with two lines (one of style "lineStyle", one of "otherLine"), an area of "areaStyle"
