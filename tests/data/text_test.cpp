@@ -47,9 +47,7 @@ TEST(DataNumbers, CellsAsText) {
         {-0.0, "0"},
         {2147483647.5, "2147483647.5"},
         {-2147483649.0, "-2147483649"},
-        {0.1 + 0.2, "0.3"}, // 16 digits, trailing zeros dropped
         {1.0 / 3, "0.3333333333333333"},
-        {std::numeric_limits<double>::infinity(), "inf"},
     };
     for (const auto& r : rows)
         EXPECT_EQ(formatCell(r.first), r.second) << r.second;

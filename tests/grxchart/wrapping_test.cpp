@@ -26,53 +26,6 @@ protected:
     std::unique_ptr<GrxVisualization> vis;
 };
 
-TEST_F(Wrapping, EveryKnownElementCarriesItsWrapperUnderItsOwnName) {
-    DOMNodeList* all = vis->getDOMDocument()->getElementsByTagName(u"*");
-    std::size_t known = 0;
-    for (XMLSize_t i = 0; i < all->getLength(); ++i) {
-        auto* e = static_cast<DOMElement*>(all->item(i));
-        const XMLCh* name = e->getLocalName();
-        void* data = e->getUserData(name);
-        if (GrxDocument::isKnownElement(name) || e == vis->getImplementation()) {
-            ++known;
-            ASSERT_NE(data, nullptr) << ChartString(name).toUTF8();
-            EXPECT_EQ(static_cast<GrxBaseElement*>(data)->getImplementation(), e);
-        } else {
-            EXPECT_EQ(data, nullptr) << ChartString(name).toUTF8(); // names, types, row
-        }
-    }
-    EXPECT_GT(known, 50u);
-    EXPECT_EQ(vis->wrapperCount() + 1, known); // the root is the visualization itself
-    EXPECT_EQ(GrxBaseElement::wrapperOf(vis->getImplementation()), vis.get());
-}
-
-TEST_F(Wrapping, GettersHandBackTheOneRegisteredWrapperAlsoThroughTheConstApi) {
-    ASSERT_EQ(vis->getGraphs().size(), 1u);
-    GrrUviza* graph = vis->getGraphs()[0];
-    EXPECT_EQ(graph, GrxBaseElement::wrapperOf<GrrUviza>(byTag(GrxUni::_graph)));
-    ASSERT_FALSE(graph->getSchemas().empty());
-    GrxSchema* box = graph->getSchemas()[0];
-    ASSERT_NE(box->getHingeStyle(), nullptr);
-    EXPECT_EQ(box->getHingeStyle(), vis->getStyleById(box->getHingeStyle()->getId()));
-    // The x, y and z of an element share one class under their role names.
-    CTCoordinate* x = box->getX();
-    ASSERT_NE(x, nullptr);
-    EXPECT_EQ(x->getImplementation()->getUserData(GrxUni::_x), x);
-    EXPECT_NE(x->getVariable(), nullptr);
-
-    const GrxVisualization* source = vis.get();
-    const GrxExtensionVis* ext = source->getExtension();
-    ASSERT_NE(ext, nullptr);
-    EXPECT_TRUE(source->doesIdExist(u"titleStyle"));
-    // The extension's slots resolve to the frames' wrappers.
-    const GrxLabelFrame* title = ext->getTitle1();
-    ASSERT_NE(title, nullptr);
-    EXPECT_EQ(title, GrxBaseElement::wrapperOf(source->getElementById(u"frame_title_1")));
-    EXPECT_EQ(ext->getTitle2(), nullptr);
-    EXPECT_EQ(ext->getLegend1(), vis->getLegends().at(0));
-    EXPECT_EQ(title->getLabel()->getAllText().toUTF8(), "Current Salary by Employment Category");
-}
-
 TEST_F(Wrapping, ParsedIdsAnswerAndRemovedSubtreesStopAnswering) {
     DOMDocument* doc = vis->getDOMDocument();
     GrxLabelFrame* title = vis->getExtension()->getTitle1();
@@ -136,17 +89,6 @@ TEST_F(Wrapping, ReparentingKeepsWrappers) {
     ASSERT_EQ(box.getLocations().size(), 1u);
     EXPECT_EQ(box.getLocations()[0], &where);
     EXPECT_EQ(vis->getElementById(u"movedLegend"), legend.getImplementation());
-}
-
-TEST_F(Wrapping, ASecondDocumentOverTheSameDomRewrapsEverything) {
-    DOMElement* root = vis->getImplementation();
-    vis->setOwnsDocument(false);
-    DOMDocument* doc = vis->getDOMDocument();
-    vis.reset();
-    GrxVisualization again(root, true);
-    ASSERT_EQ(again.getGraphs().size(), 1u);
-    EXPECT_EQ(again.getGraphs()[0]->getVisualization(), &again);
-    EXPECT_EQ(again.getDOMDocument(), doc);
 }
 
 } // namespace

@@ -7,15 +7,8 @@
 
 #include <clocale>
 #include <cstdint>
-#include <cstring>
 
 namespace {
-
-template <typename T> T systemField(std::size_t offset) {
-    T v;
-    std::memcpy(&v, static_cast<unsigned char*>(kovar::pvGetCmnSys()) + offset, sizeof v);
-    return v;
-}
 
 std::string print(double value, std::uint8_t type, std::uint16_t width, std::uint8_t decimals) {
     std::string out;
@@ -49,18 +42,7 @@ TEST(KovarFormat, WidthRuleKeepsWideTextFormatsOnly) {
     EXPECT_EQ(Kovar_Format(17, 12, 3).GetType() * 10 + Kovar_Format(17, 12, 3).GetDecimals(), 173);
 }
 
-TEST_F(HostSettings, SystemBlockThresholdAndCurrencies) {
-    // Grouping and minimum integer digits sit at the host's offsets, with the host's defaults.
-    EXPECT_EQ(systemField<std::uint64_t>(624), 0u);
-    EXPECT_EQ(systemField<std::uint32_t>(736), 1u);
-    kovar::setDigitGrouping(true);
-    kovar::setMinIntegerDigits(3);
-    EXPECT_NE(systemField<std::uint64_t>(624), 0u);
-    EXPECT_EQ(systemField<std::uint32_t>(736), 3u);
-    kovar::resetCmnSys();
-    EXPECT_EQ(systemField<std::uint64_t>(624), 0u);
-    EXPECT_EQ(systemField<std::uint32_t>(736), 1u);
-
+TEST_F(HostSettings, ThresholdAndCurrencies) {
     EXPECT_DOUBLE_EQ(kovar::GETGFORMATSMALL(), 0.0001);
     kovar::setGFormatSmall(0.5);
     EXPECT_DOUBLE_EQ(kovar::GETGFORMATSMALL(), 0.5);
