@@ -139,6 +139,7 @@ TEST(VarDataStore, StringTableCountsReferencesAndReusesSlots) {
     // Deleting the column gives back its references: the next texts reuse slots 0 and 1.
     ASSERT_TRUE(store.DeleteColumn("s", "v"));
     EXPECT_FALSE(store.DeleteColumn("s", "v"));
+    EXPECT_FALSE(store.DeleteColumn("nothing", "w"));
     VarDataProcessor::_varinfo other;
     ASSERT_TRUE(store.AddVariable("s", "w", &other));
     store.SetStringVariableValue("s", "w", 0, "a");
