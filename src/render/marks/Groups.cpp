@@ -49,6 +49,10 @@ std::size_t rowsIn(const Grouping& g) {
     return n;
 }
 
+bool stacked(const Element* mark) {
+    return attr(mark, "positionModifier") == "3" || attr(mark, "positionModifier") == "stack";
+}
+
 Grouping group(const Plot& plot, const Element* mark) {
     Grouping g;
     const Column* x = plot.columnOf(mark, "x");

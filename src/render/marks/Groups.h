@@ -36,6 +36,8 @@ double centreOf(const Plot& plot, const Grouping& g, const Summary& s, double* b
 std::size_t rowsIn(const Grouping& g);
 // Groups the shown rows of `mark` by x and split, applying its statistic.
 Grouping group(const Plot& plot, const Element* mark);
+// Whether bars or areas of `mark` stand on those of the categories before them.
+bool stacked(const Element* mark);
 
 // Where a summary stands along x, as a fraction: the centre and the width of its slot, which is
 // the category's band shared among the clusters when x is clustered.

@@ -7,10 +7,6 @@
 namespace plotaid::render {
 namespace {
 
-bool stacked(const Element* mark) {
-    return attr(mark, "positionModifier") == "3" || attr(mark, "positionModifier") == "stack";
-}
-
 void measure(Plot& plot, const Element* mark) {
     const Grouping g = group(plot, mark);
     std::map<std::size_t, double> tops;

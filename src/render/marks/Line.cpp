@@ -16,10 +16,6 @@ namespace {
 constexpr int kSamples = 80;
 constexpr std::size_t kMaxSplits = 500;
 
-bool stacked(const Element* mark) {
-    return attr(mark, "positionModifier") == "3" || attr(mark, "positionModifier") == "stack";
-}
-
 bool interpolates(const Element* mark) {
     const std::string b = attr(mark, "breakRepresentation");
     return b == "2" || b == "interpolated";
@@ -58,9 +54,10 @@ std::vector<std::vector<const Summary*>> paths(const Plot& plot, const Grouping&
 }
 
 // The points of a path; a missing value is a NaN point (a break) or, when the line interpolates,
-// left out.
+// left out. Each point stands at its value above `below`, or at `below` alone without `atValue`.
 std::vector<Point> pointsOf(const Plot& plot, const Grouping& g, const std::vector<const Summary*>& path,
-                            bool interpolate, const std::vector<double>* below = nullptr) {
+                            bool interpolate, const std::vector<double>* below = nullptr,
+                            bool atValue = true) {
     std::vector<Point> out;
     for (std::size_t i = 0; i < path.size(); ++i) {
         const Summary* s = path[i];
@@ -70,7 +67,7 @@ std::vector<Point> pointsOf(const Plot& plot, const Grouping& g, const std::vect
             continue;
         }
         const double base = below && i < below->size() ? (*below)[i] : 0;
-        out.push_back(plot.at(centreOf(plot, g, *s), plot.dims[1].at(base + s->y)));
+        out.push_back(plot.at(centreOf(plot, g, *s), plot.dims[1].at(atValue ? base + s->y : base)));
     }
     return out;
 }
@@ -255,23 +252,17 @@ void drawArea(Plot& plot, const Element* mark) {
         const auto first = std::find_if(path.begin(), path.end(), [](const Summary* s) { return s; });
         if (first == path.end())
             continue;
-        std::vector<double> below(path.size(), 0);
+        // A stacked area stands on the areas before it; another one on the floor.
+        std::vector<double> below(path.size(), 0), ground(path.size(), floor);
         for (std::size_t i = 0; i < path.size(); ++i)
             if (path[i] && stacked(mark))
-                below[i] = stackedTops[key(path[i])];
+                below[i] = ground[i] = stackedTops[key(path[i])];
         const std::vector<Point> top = pointsOf(plot, g, path, interpolate, &below);
-        std::vector<Point> bottom;
-        for (std::size_t i = 0; i < path.size(); ++i) {
-            const Summary* s = path[i];
-            if (s == nullptr || !std::isfinite(s->y)) {
-                if (!interpolate)
-                    bottom.push_back({NAN, NAN});
-                continue;
-            }
-            bottom.push_back(plot.at(centreOf(plot, g, *s), sy.at(stacked(mark) ? below[i] : floor)));
-            if (stacked(mark))
-                stackedTops[key(s)] = below[i] + s->y;
-        }
+        const std::vector<Point> bottom = pointsOf(plot, g, path, interpolate, &ground, false);
+        if (stacked(mark))
+            for (std::size_t i = 0; i < path.size(); ++i)
+                if (path[i] && std::isfinite(path[i]->y))
+                    stackedTops[key(path[i])] = below[i] + path[i]->y;
         const Style style = plot.rowStyle(mark, (*first)->firstRow);
         // Each unbroken run is one polygon: its top forward, its floor back.
         std::size_t start = 0;
